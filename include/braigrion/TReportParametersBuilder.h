@@ -1,0 +1,51 @@
+// The factory of page definitions and the answerer of questions about the
+// collected data: is this a delta view, a pre-boot collection, which
+// operating system. No answer is cached: every probe reads the repository
+// again, so a probe asked after the data were mended sees the mended data.
+#pragma once
+
+#include <string>
+
+#include <boost/shared_ptr.hpp>
+
+#include "tkrcore/CIMInterfaces.h"
+
+namespace braigrion {
+
+class TReportParametersBuilder {
+public:
+    // Operating system families, as GetOSType answers them.
+    enum EOSType {
+        kOSWindows = 0,         // Windows, CIM OSType at most 73
+        kOSWindowsServer = 1,   // Windows, CIM OSType above 73
+        kOSLinux = 2,
+        kOSVMwareESX = 3,
+        kOSUnknown = 4
+    };
+
+    TReportParametersBuilder(boost::shared_ptr<NORVTKR20::ICIMNamespace> ns, std::string mode, bool kmc);
+
+    // The flag given to the constructor.
+    bool IsKMC() const { return fKMC; }
+    // The namespace is a delta view over several collections.
+    bool IsDelta() const;
+    // The data come from the pre-boot edition; never for a delta view.
+    bool IsPreboot() const;
+    int GetOSType() const;
+    // The class by name, asked for in the first collection of a view.
+    // Throws what the namespace throws (status 15 for an absent class).
+    boost::shared_ptr<NORVTKR20::ICIMClass> GetClass(std::string name) const;
+
+private:
+    // The operating system as read from the one instance of the OS class;
+    // kOSUnknown when there is not exactly one.
+    int OSTypeFromOperatingSystem() const;
+    // Windows event log records are proof of a Windows collection.
+    bool HasWindowsEventRecords() const;
+
+    boost::shared_ptr<NORVTKR20::ICIMNamespace> fNamespace;
+    std::string fMode;
+    bool fKMC;
+};
+
+}  // namespace braigrion

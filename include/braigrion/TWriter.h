@@ -1,0 +1,140 @@
+// The abstract report writer. It holds the report logic and leaves every
+// output decision to a back-end derived from it: the back-end supplies the
+// pure operations below and sets the protected data that say where and how
+// the report is written. TTable is the only structure that crosses between
+// the two.
+#pragma once
+
+#include <map>
+#include <string>
+#include <vector>
+
+#include <boost/shared_ptr.hpp>
+
+#include "braigrion/TReportParameters.h"
+#include "braigrion/TReportParametersBuilder.h"
+#include "braigrion/TTable.h"
+#include "tkrcore/CIMInterfaces.h"
+
+namespace braigrion {
+
+class TWriter {
+public:
+    typedef std::map<std::string, NORVTKR20::TCIMValue> TContext;
+    typedef boost::shared_ptr<NORVTKR20::ICIMNamespace> TNamespacePtr;
+    typedef boost::shared_ptr<NORVTKR20::ICIMClass> TClassPtr;
+    typedef boost::shared_ptr<NORVTKR20::ICIMInstance> TInstancePtr;
+    typedef boost::shared_ptr<NORVTKR20::ICIMProperty> TPropertyPtr;
+    typedef boost::shared_ptr<const NORVTKR20::ICIMPropertyDecl> TPropertyDeclPtr;
+    typedef boost::shared_ptr<TReportParametersBuilder> TBuilderPtr;
+
+    TWriter();
+
+    // --- Driver operations ---
+
+    // Takes the namespace and reads the mode flags through the builder. A
+    // failure in reading them is logged and leaves what was read so far.
+    void BaseInitialize(TNamespacePtr ns, TContext context, TBuilderPtr builder);
+    void BaseDispose();
+    std::string GetWriterType() const { return fWriterType; }
+    // Writes one page. A page that fails is abandoned where it stood; the
+    // report goes on with the next one.
+    void WriteReportPage(TBuilderPtr builder, std::string pageID);
+
+    // --- Back-end operations, in slot order ---
+
+    virtual ~TWriter();
+    // Takes the output path and sets fOutputPath, fReportPath, fMode and
+    // fWriterType.
+    virtual void Initialize(TNamespacePtr ns, TContext context, const std::string& outputPath) = 0;
+    virtual void StartReport() = 0;
+    // Closes the open category of the index.
+    virtual void EndCategory() = 0;
+    virtual void WriteCategory(const std::string& categoryName) = 0;
+    virtual void EndReport() = 0;
+    // For an inventory back-end: the text of the page just written.
+    virtual std::string GetInventoryPage() = 0;
+    // Raw-data pages: each returns the link name of the page it wrote, or ""
+    // when it wrote none.
+    virtual std::string WriteLSIRawDataReport(std::string& linkName);
+    virtual std::string WriteHalcyonRawDataReport(std::string linkName);
+    virtual std::string WriteHalcyonManagerRawDataReport(std::string linkName);
+    virtual void WriteHalcyonEventLog(const std::vector<TInstancePtr>& records, const std::string& fileStem,
+                                      const std::string& title) = 0;
+    virtual std::string WriteQLogicRawDataReport(std::string linkName);
+    virtual std::string WriteEmulexRawDataReport(std::string linkName);
+    // One Windows event log page, whole.
+    virtual void WriteEventLogReport(TReportParameters params) = 0;
+    virtual void ReservedSlot15() {}
+    // The merged log page, whole.
+    virtual void WriteMergedLogPage(TReportParameters params) = 0;
+    virtual void ReservedSlot17() {}
+    virtual void WriteMelodyPrologue(const std::string& headerText) = 0;
+    virtual void WriteMelodyDeviceRow(TInstancePtr device, const std::string& score, const std::string& type,
+                                      const std::string& cimType, const std::string& propertyName,
+                                      const std::string& value, const std::string& frequency,
+                                      const std::string& commonValues, int commonFrequencies) = 0;
+    virtual void WriteMelodyTableStart() = 0;
+    virtual void ReservedSlot21() {}
+    virtual void ReservedSlot22() {}
+    virtual void ReservedSlot23() {}
+    virtual void WriteDriveHealthEntry(TPropertyPtr rawData) = 0;
+    virtual void WriteDeclarationHeader(TPropertyDeclPtr declaration) = 0;
+    virtual void WriteDriveHealthValue(TInstancePtr instance, TPropertyPtr property) = 0;
+    virtual void WriteRegisterValue(TInstancePtr instance, TPropertyPtr property) = 0;
+    virtual void OpenPage(const std::string& path) = 0;
+    virtual void ClosePage() = 0;
+    virtual void WritePageHeader() = 0;
+    virtual void WritePageFooter() = 0;
+    // The last two are empty on most pages.
+    virtual void WriteReportTitle(const std::string& title, const std::string& link,
+                                  const std::string& linkText) = 0;
+    virtual void WriteReportTitleWithLink(const std::string& title, const std::string& link,
+                                          const std::string& linkText) = 0;
+    // The last step of every page: its line in the index.
+    virtual void WriteIndexEntry(const std::string& linkName, const std::string& reportName,
+                                 const bool& hasData) = 0;
+    virtual void WriteTableBreak() = 0;
+    virtual void WriteTableTitle(const std::string& title, const bool& a, const bool& b) = 0;
+    virtual void StartColumnTable(const std::string& tableWidth, const std::string& summary, bool sortable) = 0;
+    virtual void ReservedSlot38() {}
+    virtual void StartPropertyTable(const std::string& tableWidth, const std::string& headerWidth,
+                                    const std::string& title) = 0;
+    virtual void WriteHeaderCell(TClassPtr cls, TReportProperty property) = 0;
+    virtual void EndTableHeader() = 0;
+    virtual void StartRow(const bool& first) = 0;
+    virtual void EndRow() = 0;
+    virtual void EndTable() = 0;
+    virtual void WriteRowBreak(int span) = 0;
+    // The generic engine's only table operation.
+    virtual void WriteTableGrid(TTable& table) = 0;
+    virtual void ReservedSlot47() {}
+    virtual void ReservedSlot48() {}
+    virtual void WriteValueCell(TInstancePtr instance, TReportProperty property, std::string text) = 0;
+    virtual void WriteTextCell(TReportProperty property, std::string text, std::string link) = 0;
+    virtual void WriteMessageCell(TReportProperty property, const std::string& message) = 0;
+    virtual void WriteSensorCell(TInstancePtr sensor, const std::string& readingProperty,
+                                 const std::string& modifierProperty) = 0;
+    // Between OpenPage and WritePageHeader on declared pages.
+    virtual void WriteSortScript() = 0;
+    virtual std::string EscapeText(std::string text) = 0;
+    // The text put between array elements for TReportProperty::GetArrayValueSeparator.
+    virtual std::string GetSeparatorText(int separator) = 0;
+
+protected:
+    TNamespacePtr fNamespace;
+    std::string fOutputPath;  // every page path is fOutputPath + kFileSeparator + link name
+    std::string fReportPath;  // the back-end's second path
+    std::string fMode;        // "default", or "luz"
+    std::string fWriterType;  // one of the TKR_WRITER_TYPE_* names
+    bool fPreboot;
+    bool fKMC;
+    int fProviderType;  // 1 for a delta view
+    int fOSType;        // as TReportParametersBuilder::GetOSType answers
+
+private:
+    TWriter(const TWriter&) = delete;
+    TWriter& operator=(const TWriter&) = delete;
+};
+
+}  // namespace braigrion

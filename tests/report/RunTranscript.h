@@ -1,0 +1,33 @@
+// Runs a report against the recording writer and gives its transcript, with
+// a "page <id>" line wherever the driver asked for a page.
+#pragma once
+
+#include <map>
+#include <string>
+
+#include "braigrion/TReport.h"
+#include "support/LogCapture.h"
+#include "support/RecordingWriter.h"
+
+namespace braigrion {
+namespace testing {
+
+class TReportRun {
+public:
+    explicit TReportRun(const std::string& writerType = "html") : writer(writerType) {
+        log.SetListener([this](int, const std::string& line) {
+            static const std::string kUnknownPage = "TWriter::WriteReportPage -- Unknow PageID = ";
+            if (line.compare(0, kUnknownPage.size(), kUnknownPage) == 0) {
+                writer.Note("page " + line.substr(kUnknownPage.size()));
+            }
+        });
+    }
+
+    TLogCapture log;
+    TRecordingWriter writer;
+};
+
+typedef std::map<std::string, NORVTKR20::TCIMValue> TContextMap;
+
+}  // namespace testing
+}  // namespace braigrion
