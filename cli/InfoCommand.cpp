@@ -1,0 +1,58 @@
+#include <algorithm>
+#include <iomanip>
+#include <ostream>
+
+#include "CollectionLoader.h"
+#include "Commands.h"
+#include "repository/MemoryClass.h"
+#include "tkrcore/tkrcore.h"
+
+namespace braigrion {
+namespace cli {
+
+namespace {
+
+void Fact(std::ostream& out, const char* label, const std::string& value) {
+    out << "  " << std::left << std::setw(22) << label << (value.empty() ? "(not recorded)" : value) << '\n';
+}
+
+}  // namespace
+
+int RunInfo(const TInfoOptions& options, std::ostream& out, std::ostream& err) {
+    repository::TLoadResult loaded = LoadFiles(options.fFiles);
+    for (const std::string& w : loaded.fWarnings) err << "braigrion: warning: " << w << '\n';
+    auto ns = loaded.fNamespace;
+    NORVTKR20::TCIMContext context;
+
+    out << "Collection: ";
+    for (size_t i = 0; i < options.fFiles.size(); ++i) out << (i ? ", " : "") << options.fFiles[i];
+    out << "\n\nData source\n";
+    Fact(out, "Build", NORVTKR20::TCIMSchemaHelper::GetDataSourceBuild(ns, context));
+    std::string major = NORVTKR20::TCIMSchemaHelper::GetDataSourceMajorVersion(ns, context);
+    std::string minor = NORVTKR20::TCIMSchemaHelper::GetDataSourceMinorVersion(ns, context);
+    Fact(out, "Version", major.empty() && minor.empty() ? std::string() : major + "." + minor);
+    Fact(out, "Serial number", NORVTKR20::TCIMSchemaHelper::GetRawSerialNumberString(ns, context));
+    Fact(out, "OS version", NORVTKR20::TCIMSchemaHelper::GetOperatingSystemVersion(ns));
+
+    std::vector<repository::TMemoryClass*> classes = ns->GetClasses();
+    std::sort(classes.begin(), classes.end(), [](repository::TMemoryClass* a, repository::TMemoryClass* b) {
+        return a->GetName() < b->GetName();
+    });
+    size_t width = 5;
+    size_t empty = 0;
+    for (auto* c : classes) {
+        if (c->GetInstanceCount()) width = std::max(width, c->GetName().size());
+        else ++empty;
+    }
+    out << "\nClasses with instances (" << classes.size() - empty << " of " << classes.size() << " classes)\n";
+    for (auto* c : classes) {
+        if (!c->GetInstanceCount()) continue;
+        out << "  " << std::left << std::setw(static_cast<int>(width)) << c->GetName() << "  " << std::right
+            << std::setw(9) << c->GetInstanceCount() << '\n';
+    }
+    out << "\nInstances: " << ns->GetInstanceCount() << '\n';
+    return 0;
+}
+
+}  // namespace cli
+}  // namespace braigrion

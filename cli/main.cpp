@@ -1,0 +1,55 @@
+// The braigrion command: turns a collection of CIM-XML files into a report.
+#include <CLI/CLI.hpp>
+
+#include <exception>
+#include <iostream>
+
+#include "CollectionLoader.h"
+#include "Commands.h"
+
+namespace {
+
+const char kVersion[] = "braigrion 0.1.0";
+
+}  // namespace
+
+int main(int argc, char** argv) {
+    CLI::App app{"braigrion: reports on a server's collected diagnostic and inventory data"};
+    app.set_version_flag("--version", kVersion);
+    app.require_subcommand(1);
+
+    braigrion::cli::TInfoOptions info;
+    CLI::App* infoCmd = app.add_subcommand("info", "Print what a collection holds: data source facts, classes, counts");
+    infoCmd->add_option("collection", info.fFiles, "CIM-XML files that together form one collection")
+        ->required()
+        ->type_name("FILE");
+
+    // CLI11 would call an unknown word a missing subcommand; name it instead.
+    if (argc > 1 && argv[1][0] != '-' && app.get_subcommands([&](CLI::App* sub) { return sub->get_name() == argv[1]; }).empty()) {
+        std::cerr << "braigrion: unknown command '" << argv[1] << "' (see braigrion --help)\n";
+        return 2;
+    }
+    try {
+        app.parse(argc, argv);
+    } catch (const CLI::CallForHelp& e) {
+        return app.exit(e);
+    } catch (const CLI::CallForAllHelp& e) {
+        return app.exit(e);
+    } catch (const CLI::CallForVersion& e) {
+        return app.exit(e);
+    } catch (const CLI::ParseError& e) {
+        std::cerr << "braigrion: " << e.what() << " (see braigrion --help)\n";
+        return 2;
+    }
+
+    try {
+        if (*infoCmd) return braigrion::cli::RunInfo(info, std::cout, std::cerr);
+    } catch (const braigrion::cli::TInputError& e) {
+        std::cerr << "braigrion: " << e.what() << '\n';
+        return 2;
+    } catch (const std::exception& e) {
+        std::cerr << "braigrion: " << e.what() << '\n';
+        return 1;
+    }
+    return 1;
+}
