@@ -8,6 +8,7 @@
 
 #include <boost/shared_ptr.hpp>
 
+#include "braigrion/TReportParameters.h"
 #include "tkrcore/CIMInterfaces.h"
 
 namespace braigrion {
@@ -35,6 +36,41 @@ public:
     // The class by name, asked for in the first collection of a view.
     // Throws what the namespace throws (status 15 for an absent class).
     boost::shared_ptr<NORVTKR20::ICIMClass> GetClass(std::string name) const;
+
+    // Probes of the collected data. A class that is absent answers false.
+    // The data source version as major "." first digit of minor; a pre-boot
+    // collection counts as at least 3. Callers compare it as text.
+    std::string GetDataSourceVersion() const;
+    bool IsLookout() const;        // the service processor reports a lookout
+    bool IsMultiNode() const;      // the computer system has two nodes or more
+    bool HasTeamInfo() const;      // some physical port belongs to a NIC team
+    bool IsSupportKMCKey() const;  // a hardware activation key is installed
+    bool IsRedHat() const;         // the one operating system is Red Hat's
+
+    // Software pages.
+    TReportParameters BuildSystemConfigParams() const;
+    TReportParameters BuildOSConfigParams() const;
+    TReportParameters BuildSysConfigParams() const;
+    TReportParameters BuildInstalledAppsParams() const;
+    TReportParameters BuildInstalledFixesParams() const;
+    TReportParameters BuildInstalledRPMParams() const;
+    TReportParameters BuildWindowsComponentsParams() const;
+    TReportParameters BuildSystemServiceParams() const;
+    TReportParameters BuildDeviceDriverParams() const;
+    TReportParameters BuildKernelModuleParams() const;
+    TReportParameters BuildProcessesParams() const;
+    TReportParameters BuildResourceUtilizationParams() const;
+    TReportParameters BuildVmware3iParams() const;
+    TReportParameters BuildPBParams() const;
+
+    // Network pages: one link, chosen by HasTeamInfo.
+    TReportParameters BuildNetworkWithTeamingParams() const;
+    TReportParameters BuildNetworkWithoutTeamingParams() const;
+
+    // Hardware pages.
+    TReportParameters BuildHardwareInfoParams() const;
+    TReportParameters BuildPCIInfoParams() const;
+    TReportParameters BuildFirmwareParams() const;
 
 private:
     // The operating system as read from the one instance of the OS class;
