@@ -1,20 +1,60 @@
-// The subcommands of the braigrion command.
+// The subcommands of the braigrion command. Each has its options, a function
+// that adds it to the command line, and a function that runs it and returns
+// the exit status: 0 on success, 2 for a usage or input error, 1 for any
+// other failure (errors are thrown; main turns them into one line).
 #pragma once
 
 #include <iosfwd>
 #include <string>
 #include <vector>
 
+namespace CLI {
+class App;
+}
+
 namespace braigrion {
 namespace cli {
+
+// What a report or a page is written under: the context keys and the log.
+struct TRunOptions {
+    std::string fMode = "default";  // "default" or "luz"
+    bool fKMC = false;
+    bool fVCX = false;
+    std::string fLogFile;  // "" logs nowhere unless a level is given
+    int fLogLevel = -1;    // -1: 0 with a log file, no log without one
+};
 
 struct TInfoOptions {
     std::vector<std::string> fFiles;
 };
 
-// Prints what a collection holds: its data source facts and its classes with
-// their instance counts. Returns the exit status.
+struct TReportOptions {
+    std::vector<std::string> fFiles;
+    std::string fOutput;
+    std::string fFormat = "html";  // "html" or "text"
+    bool fForce = false;           // replace a directory that is not a report
+    bool fQuiet = false;           // no progress
+    TRunOptions fRun;
+};
+
+struct TPageOptions {
+    std::string fPageID;
+    std::vector<std::string> fFiles;
+    TRunOptions fRun;
+};
+
+CLI::App* AddInfoCommand(CLI::App& app, TInfoOptions& options);
+CLI::App* AddReportCommand(CLI::App& app, TReportOptions& options);
+CLI::App* AddPageCommand(CLI::App& app, TPageOptions& options);
+
+// Prints what a collection holds: its data source facts, its operating
+// system and its classes with their instance counts.
 int RunInfo(const TInfoOptions& options, std::ostream& out, std::ostream& err);
+// Writes the report of a collection into a directory and prints the path of
+// its index. Progress goes to `err` when `progressToErr`.
+int RunReport(const TReportOptions& options, std::ostream& out, std::ostream& err, bool progressToErr);
+// Prints one page through the inventory back-end.
+int RunPage(const TPageOptions& options, std::ostream& out, std::ostream& err);
 
 }  // namespace cli
 }  // namespace braigrion

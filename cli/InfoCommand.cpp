@@ -1,9 +1,12 @@
+#include <CLI/CLI.hpp>
+
 #include <algorithm>
 #include <iomanip>
 #include <ostream>
 
 #include "CollectionLoader.h"
 #include "Commands.h"
+#include "braigrion/TReportParametersBuilder.h"
 #include "repository/MemoryClass.h"
 #include "tkrcore/tkrcore.h"
 
@@ -16,7 +19,26 @@ void Fact(std::ostream& out, const char* label, const std::string& value) {
     out << "  " << std::left << std::setw(22) << label << (value.empty() ? "(not recorded)" : value) << '\n';
 }
 
+const char* OSTypeName(int type) {
+    switch (type) {
+        case TReportParametersBuilder::kOSWindows:
+        case TReportParametersBuilder::kOSWindowsServer: return "Windows";
+        case TReportParametersBuilder::kOSLinux: return "Linux";
+        case TReportParametersBuilder::kOSVMwareESX: return "VMware ESX";
+        default: return "";
+    }
+}
+
 }  // namespace
+
+CLI::App* AddInfoCommand(CLI::App& app, TInfoOptions& options) {
+    CLI::App* command =
+        app.add_subcommand("info", "Print what a collection holds: data source facts, OS type, classes, counts");
+    command->add_option("collection", options.fFiles, "CIM-XML files that together form one collection")
+        ->required()
+        ->type_name("FILE");
+    return command;
+}
 
 int RunInfo(const TInfoOptions& options, std::ostream& out, std::ostream& err) {
     repository::TLoadResult loaded = LoadFiles(options.fFiles);
@@ -33,6 +55,7 @@ int RunInfo(const TInfoOptions& options, std::ostream& out, std::ostream& err) {
     Fact(out, "Version", major.empty() && minor.empty() ? std::string() : major + "." + minor);
     Fact(out, "Serial number", NORVTKR20::TCIMSchemaHelper::GetRawSerialNumberString(ns, context));
     Fact(out, "OS version", NORVTKR20::TCIMSchemaHelper::GetOperatingSystemVersion(ns));
+    Fact(out, "OS type", OSTypeName(TReportParametersBuilder(ns, "default", false).GetOSType()));
 
     std::vector<repository::TMemoryClass*> classes = ns->GetClasses();
     std::sort(classes.begin(), classes.end(), [](repository::TMemoryClass* a, repository::TMemoryClass* b) {

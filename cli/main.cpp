@@ -4,6 +4,8 @@
 #include <exception>
 #include <iostream>
 
+#include <unistd.h>
+
 #include "CollectionLoader.h"
 #include "Commands.h"
 
@@ -19,10 +21,11 @@ int main(int argc, char** argv) {
     app.require_subcommand(1);
 
     braigrion::cli::TInfoOptions info;
-    CLI::App* infoCmd = app.add_subcommand("info", "Print what a collection holds: data source facts, classes, counts");
-    infoCmd->add_option("collection", info.fFiles, "CIM-XML files that together form one collection")
-        ->required()
-        ->type_name("FILE");
+    braigrion::cli::TReportOptions report;
+    braigrion::cli::TPageOptions page;
+    CLI::App* infoCmd = braigrion::cli::AddInfoCommand(app, info);
+    CLI::App* reportCmd = braigrion::cli::AddReportCommand(app, report);
+    CLI::App* pageCmd = braigrion::cli::AddPageCommand(app, page);
 
     // CLI11 would call an unknown word a missing subcommand; name it instead.
     if (argc > 1 && argv[1][0] != '-' && app.get_subcommands([&](CLI::App* sub) { return sub->get_name() == argv[1]; }).empty()) {
@@ -44,6 +47,8 @@ int main(int argc, char** argv) {
 
     try {
         if (*infoCmd) return braigrion::cli::RunInfo(info, std::cout, std::cerr);
+        if (*reportCmd) return braigrion::cli::RunReport(report, std::cout, std::cerr, isatty(STDERR_FILENO) != 0);
+        if (*pageCmd) return braigrion::cli::RunPage(page, std::cout, std::cerr);
     } catch (const braigrion::cli::TInputError& e) {
         std::cerr << "braigrion: " << e.what() << '\n';
         return 2;

@@ -1,7 +1,13 @@
 #!/usr/bin/env bash
 # Installs the Debian packages that building and testing braigrion needs.
 # Safe to run again: apt-get only installs what is missing.
+#   scripts/setup.sh           what building needs
+#   scripts/setup.sh --tests   also what the browser tests need: Chromium,
+#                              Node.js and the npm packages of tests/browser
 set -euo pipefail
+here="$(cd "$(dirname "$0")/.." && pwd)"
+tests=0
+[ "${1:-}" = "--tests" ] && tests=1
 
 packages=(
   build-essential cmake ninja-build pkg-config
@@ -22,3 +28,20 @@ export DEBIAN_FRONTEND=noninteractive
 $SUDO apt-get update -qq
 $SUDO apt-get install -y -qq --no-install-recommends "${packages[@]}" >/dev/null
 echo "setup: build dependencies are installed"
+
+if [ "$tests" -eq 1 ]; then
+  # Chromium is the browser of the browser tests. Without it they report
+  # themselves skipped, so a failure here is a warning, not an error.
+  if ! command -v chromium >/dev/null 2>&1; then
+    if ! $SUDO apt-get install -y -qq --no-install-recommends chromium fonts-dejavu-core >/dev/null; then
+      echo "setup: warning: chromium could not be installed; the browser tests will be skipped" >&2
+    fi
+  fi
+  if ! command -v node >/dev/null 2>&1 || ! command -v npm >/dev/null 2>&1; then
+    $SUDO apt-get install -y -qq --no-install-recommends nodejs npm >/dev/null
+  fi
+  if [ ! -f "$here/tests/browser/node_modules/playwright-core/package.json" ]; then
+    (cd "$here/tests/browser" && npm ci --no-audit --no-fund --loglevel=error)
+  fi
+  echo "setup: test dependencies are installed"
+fi

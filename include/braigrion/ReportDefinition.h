@@ -1,10 +1,13 @@
 // The names the report is built from: writer types, the categories that group
 // the pages in the navigation, and the page identifiers by which the driver
-// asks for a page. Each translation unit that includes this header gets its
-// own set of these strings, initialised when it is loaded.
+// asks for a page, and with them the mark-up fragments of the HTML back-end.
+// Each translation unit that includes this header gets its own set of these
+// strings, initialised when it is loaded.
 #pragma once
 
 #include <string>
+
+#include "braigrion/MarkupConstants.h"
 
 namespace TKR_REPORT_DEFINITION {
 

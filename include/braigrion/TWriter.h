@@ -41,6 +41,108 @@ public:
     // report goes on with the next one.
     void WriteReportPage(TBuilderPtr builder, std::string pageID);
 
+    // --- Value rendering ---
+
+    // The text of an instance's property: a date in its display form, an
+    // array's elements each made safe by EscapeText and joined by
+    // `separator`, any other value's display text made safe. "" when the
+    // instance lacks the property.
+    std::string GetPropertyValue(TInstancePtr instance, std::string propertyName, std::string separator);
+    // The same from a property. With `useMappedText` a scalar gives its
+    // mapped text as the repository has it.
+    std::string GetValueFromProperty(TPropertyPtr property, std::string separator, bool useMappedText);
+    // The texts of several properties, with `separator` before each value
+    // that is not empty.
+    std::string GetValuesFromProperties(std::vector<TPropertyPtr> properties, const std::string& separator,
+                                        bool useMappedText);
+    // The property of every instance reached through the association,
+    // joined by blanks; "" when the association cannot be walked.
+    std::string GetPropertyValueFromAssociation(TInstancePtr instance, std::string assocClass, std::string resultClass,
+                                                std::string role, std::string property);
+    // The class name made safe, with "_" and the property's text when a
+    // property is named.
+    std::string GetUniqueId(TInstancePtr instance, std::string propertyName);
+    // "CurrentReading" scaled by ten to the power "UnitModifier"; "N/A"
+    // when either cannot be read.
+    std::string GetNumericSensorValue(TInstancePtr instance, bool asReading);
+    // The label of a column: a fixed label for a few properties, the
+    // column's own label, the declaration's display name, or the property's
+    // name when it has no declaration.
+    std::string GetTableHeaderLabel(NORVTKR20::ICIMClass& cls, TReportProperty property, TContext context);
+
+    // --- Table engine ---
+
+    // Writes one declared table for these instances: its title, then one
+    // grid per group of at most MaxInstancesPerTable instances, and under
+    // each instance of a top-level table with associated classes the
+    // nested tables of those classes.
+    void WriteTable(TReportClass reportClass, std::vector<TInstancePtr> instances, bool isTopLevel,
+                    bool isAssociated, TContext context);
+    typedef std::vector<TReportClass>::iterator TClassIterator;
+    // Moves the classes of [first, last) that have an instance passing
+    // their filters to the front, in their order, and returns the end of
+    // those; the caller erases the rest.
+    TClassIterator ClassFilter(TClassIterator first, TClassIterator last);
+
+    // --- Generic pages ---
+
+    // A whole page from a definition: page frame, title, one table per
+    // class, index entry.
+    void WriteGenericReport(TReportParameters params);
+    // The same page with a link to its raw-data page in the title.
+    void WriteGenericReportWithLink(TReportParameters params, const std::string& link);
+
+    // --- Page generators ---
+    // WriteReportPage calls one of these per page id. Each decides by the
+    // mode flags whether and how its page is written.
+
+    void Generator_SystemOverview(TBuilderPtr builder, std::string pageID);
+    void Generator_CriticalDetails(TBuilderPtr builder, std::string pageID);
+    void Generator_OSInstallation(TBuilderPtr builder, std::string pageID);
+    void Generator_NetworkSettings(TBuilderPtr builder, std::string pageID);
+    void Generator_ResourceUtilization(TBuilderPtr builder, std::string pageID);
+    void Generator_Processes(TBuilderPtr builder, std::string pageID);
+    void Generator_OSConfiguration(TBuilderPtr builder, std::string pageID);
+    void Generator_HardwareInventory(TBuilderPtr builder, std::string pageID);
+    void Generator_PCIInformation(TBuilderPtr builder, std::string pageID);
+    void Generator_FirmwareVPD(TBuilderPtr builder, std::string pageID);
+    void Generator_ServProcConfiguration(TBuilderPtr builder, std::string pageID);
+    void Generator_Environmentals(TBuilderPtr builder, std::string pageID);
+    void Generator_DriveHealth(TBuilderPtr builder, std::string pageID);
+    void Generator_LSIController(TBuilderPtr builder, std::string pageID);
+    void Generator_LSIIDEController(TBuilderPtr builder, std::string pageID);
+    void Generator_Mellanox(TBuilderPtr builder, std::string pageID);
+    void Generator_Solarflare(TBuilderPtr builder, std::string pageID);
+    void Generator_FusionIO(TBuilderPtr builder, std::string pageID);
+    void Generator_PMCRAID(TBuilderPtr builder, std::string pageID);
+    void Generator_Halcyon(TBuilderPtr builder, std::string pageID);
+    void Generator_HalcyonLogs(TBuilderPtr builder, std::string pageID);
+    void Generator_QLogic(TBuilderPtr builder, std::string pageID);
+    void Generator_Emulex(TBuilderPtr builder, std::string pageID);
+    void Generator_Broadcom(TBuilderPtr builder, std::string pageID);
+    void Generator_BrocadeAdapter(TBuilderPtr builder, std::string pageID);
+    void Generator_VMwareESXi(TBuilderPtr builder, std::string pageID);
+    void Generator_GlowTrace(TBuilderPtr builder, std::string pageID);
+    void Generator_SelfBIST(TBuilderPtr builder, std::string pageID);
+    void Generator_KMCLicenseKey(TBuilderPtr builder, std::string pageID);
+    void Generator_BIOSSettings(TBuilderPtr builder, std::string pageID);
+    void Generator_VCX(TBuilderPtr builder, std::string pageID);
+    void Generator_OSLogs(TBuilderPtr builder, std::string pageID);
+    void Generator_ServProcEvent(TBuilderPtr builder, std::string pageID);
+    void Generator_QVAChipsetRegister(TBuilderPtr builder, std::string pageID);
+    void Generator_CFTSetting(TBuilderPtr builder, std::string pageID);
+    void Generator_NVSMILog(TBuilderPtr builder, std::string pageID);
+    void Generator_AMDAticonfigLog(TBuilderPtr builder, std::string pageID);
+    void Generator_SPINTLog(TBuilderPtr builder, std::string pageID);
+    void Generator_MergedLog(TBuilderPtr builder, std::string pageID);
+    void Generator_MergedDevice(TBuilderPtr builder, std::string pageID);
+    void Generator_Melody(TBuilderPtr builder, std::string pageID);
+    void Generator_PatchBeacon(TBuilderPtr builder, std::string pageID);
+    void Generator_FileLoader(TBuilderPtr builder, std::string pageID);
+    void Generator_DiagnosticLog(TBuilderPtr builder, std::string pageID);
+    void Generator_TKRErrorLog(TBuilderPtr builder, std::string pageID);
+    void Generator_Diablo(TBuilderPtr builder, std::string pageID);
+
     // --- Back-end operations, in slot order ---
 
     virtual ~TWriter();
@@ -133,8 +235,22 @@ protected:
     int fOSType;        // as TReportParametersBuilder::GetOSType answers
 
 private:
+    // Stands in a generator for a page whose definition or section writer
+    // is not part of the library yet: writes nothing and logs the line of a
+    // page without generator, so that the report keeps its shape. Each call
+    // stands for one page that the generator will write.
+    void NotYetGenerated(const std::string& pageID);
+
     TWriter(const TWriter&) = delete;
     TWriter& operator=(const TWriter&) = delete;
 };
+
+// Orderings of patch results by their "Type" and "Name" texts; an instance
+// whose text cannot be read orders after nothing.
+bool pb_comp_type(boost::shared_ptr<NORVTKR20::ICIMInstance> a, boost::shared_ptr<NORVTKR20::ICIMInstance> b);
+bool pb_comp_name(boost::shared_ptr<NORVTKR20::ICIMInstance> a, boost::shared_ptr<NORVTKR20::ICIMInstance> b);
+// A copy of the patch results ordered by type, and within a type by name.
+std::vector<boost::shared_ptr<NORVTKR20::ICIMInstance>> PBResultSort(
+    std::vector<boost::shared_ptr<NORVTKR20::ICIMInstance>>& results);
 
 }  // namespace braigrion

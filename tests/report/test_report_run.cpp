@@ -1,5 +1,6 @@
 // The shape of a report run: categories, pages and their conditions, as the
 // back-end sees them, and the driver's modes as read from the context.
+#include <cstdlib>
 #include <ostream>
 #include <string>
 #include <vector>
@@ -21,11 +22,18 @@ using testing::TReportRun;
 
 const char kWindows[] = "ORVSG_OperatingSystem ProductVendor=\"Microsoft Corporation\" OSType=uint16:73\n";
 
-// A whole run over a Windows collection in the default mode.
+// A whole run over a Windows collection in the default mode. A "page" line
+// stands for each page a generator writes: the installation page of Windows
+// has five parts, the service processor logs three; the license key page is
+// left out without KMC, the BIOS settings page without its switch.
 const char kDefaultRun[] = R"(Initialize("out", mode="default")
 StartReport()
 WriteCategory("Software")
 page SystemConfig
+page OSInstallations
+page OSInstallations
+page OSInstallations
+page OSInstallations
 page OSInstallations
 page NetworkWithTeaming
 page ResourceUtilization
@@ -54,13 +62,13 @@ page Brocade
 page Vmware3i
 page GlowTrace
 page BIST
-page KMCLicenseKey
-page BIOSSettings
 EndCategory()
 WriteCategory("Windows Logs")
 page OSLogs
 EndCategory()
 WriteCategory("SP Logs")
+page SPLogs
+page SPLogs
 page SPLogs
 EndCategory()
 WriteCategory("Analysis")
@@ -74,6 +82,39 @@ EndCategory()
 page TKRLog
 EndReport()
 )";
+
+// A delta view: only the comparing generators have pages; the others say
+// that they do nothing.
+const char kDeltaRun[] = R"(Initialize("out", mode="default")
+StartReport()
+WriteCategory("Software")
+page SystemConfig
+page OSInstallations
+page OSInstallations
+page OSInstallations
+page OSInstallations
+page OSInstallations
+page NetworkWithTeaming
+page ResourceUtilization
+page Processes
+page OSConfiguration
+EndCategory()
+WriteCategory("Hardware")
+page HardwareInfo
+page PCIInfo
+page Firmware
+EndCategory()
+WriteCategory("Windows Logs")
+EndCategory()
+WriteCategory("SP Logs")
+EndCategory()
+WriteCategory("Analysis")
+EndCategory()
+EndReport()
+)";
+
+const char kWindowsInstallation[] =
+    "page OSInstallations\npage OSInstallations\npage OSInstallations\npage OSInstallations\npage OSInstallations\n";
 
 // Replaces the one occurrence of `from`; fails the test when there is none.
 std::string Edit(std::string text, const std::string& from, const std::string& to) {
@@ -103,6 +144,7 @@ class ReportRunTest : public ::testing::TestWithParam<TRunCase> {};
 
 TEST_P(ReportRunTest, WritesTheCategoriesAndPagesOfItsMode) {
     const TRunCase& c = GetParam();
+    unsetenv("TKR_BIOSPROVIDER");  // the BIOS settings page stays switched off
     TRepoBuilder repo;
     repo.Parse(c.repository);
     TReportRun run;
@@ -124,41 +166,54 @@ INSTANTIATE_TEST_SUITE_P(
                  kWindows,
                  {{"mode", TCIMValue("luz")}},
                  {{"mode=\"default\"", "mode=\"luz\""},
-                  {"page SPLogs\n",
+                  // The PCI page has a raw-data page beside it.
+                  {"page PCIInfo\n", "page PCIInfo\npage PCIInfo\n"},
+                  {"page SPLogs\nEndCategory()\n",
                    "page SPLogs\nEndCategory()\nWriteCategory(\"ORV Service\")\npage QVAChipsetRegister\n"
-                   "page CFTSetting\npage NVSMILog\npage AMDAticonfigLog\npage SPINTLog\n"}},
+                   "page CFTSetting\npage NVSMILog\npage AMDAticonfigLog\npage SPINTLog\nEndCategory()\n"}},
                  {}},
         // Only the exact word "luz" selects the mode.
         TRunCase{"LuzIsCaseSensitive", kWindows, {{"mode", TCIMValue("LUZ")}}, {{"mode=\"default\"", "mode=\"LUZ\""}}, {}},
         TRunCase{"Linux",
                  "ORVSG_OperatingSystem ProductVendor=\"Red Hat\" OSType=uint16:36",
                  {},
-                 {{"Windows Logs", "Linux Logs"}},
-                 {}},
+                 {{"Windows Logs", "Linux Logs"},
+                  {kWindowsInstallation, "page OSInstallations\npage OSInstallations\npage OSInstallations\n"},
+                  {"page OSConfiguration\n", "page OSConfiguration\npage OSConfiguration\n"}},
+                 {"TWriter::Generator_OSConfiguration -- Under Linux, write Linux Config Files"}},
         // Pre-boot: no OS Logs category and no EndCategory for it, so the
         // service processor category's EndCategory closes "Hardware".
         TRunCase{"Preboot",
                  "ORVSG_CollectionInfo Build=\"4.0.1-preboot\"\n",
                  {},
-                 {{kOSLogs, ""}},
+                 {{kOSLogs, ""},
+                  {kWindowsInstallation, ""},
+                  {"page ResourceUtilization\npage Processes\n", ""}},
                  {"TReport::TReport -- TKR type is Preboot ",
-                  "TReport::Write -- Under pTKR, no OS Logs information needed"}},
+                  "TReport::Write -- Under pTKR, no OS Logs information needed",
+                  "TWriter::Generator_OSInstallation -- Under pTKR, no OS installation information needed",
+                  "TWriter::Generator_ResourceUtilization -- Under pTKR, no Resource Utilization information needed",
+                  "TWriter::Generator_Processes -- Under pTKR, no Process information needed"}},
         // An unknown system: the category is closed but gets no heading and no page.
         TRunCase{"UnknownOSType",
                  "ORVSG_OperatingSystem ProductVendor=\"Sun\" OSType=uint16:29",
                  {},
-                 {{kOSLogs, "EndCategory()\n"}},
+                 {{kOSLogs, "EndCategory()\n"}, {kWindowsInstallation, "page OSInstallations\n"}},
                  {"TReport::Write -- Unknow OS type]"}},
         TRunCase{"KMC",
                  kWindows,
                  {{"KMC", TCIMValue("true")}},
-                 {{"page BIOSSettings\n", "page BIOSSettings\npage VCX\n"}, {"SP Logs", "KMC Logs"}},
+                 {{"page BIST\n", "page BIST\npage KMCLicenseKey\npage VCX\n"},
+                  {"SP Logs", "KMC Logs"},
+                  {"page SPLogs\npage SPLogs\npage SPLogs\n", "page SPLogs\n"}},
                  {}},
         TRunCase{"VCXOverridesKMC", kWindows, {{"KMC", TCIMValue("TRUE")}, {"VCX", TCIMValue("FALSE")}}, {}, {}},
         TRunCase{"VCXAlone",
                  kWindows,
                  {{"VCX", TCIMValue("True")}},
-                 {{"page BIOSSettings\n", "page BIOSSettings\npage VCX\n"}, {"SP Logs", "KMC Logs"}},
+                 {{"page BIST\n", "page BIST\npage KMCLicenseKey\npage VCX\n"},
+                  {"SP Logs", "KMC Logs"},
+                  {"page SPLogs\npage SPLogs\npage SPLogs\n", "page SPLogs\n"}},
                  {"TReport::TReport -- Can not detected KMC from TCIMContext, set fKMC to FALSE "}}),
     [](const ::testing::TestParamInfo<TRunCase>& info) { return std::string(info.param.name); });
 
@@ -213,7 +268,9 @@ TEST(ReportRun, DeltaViewSkipsRepairsAndThePrebootTest) {
     report.Write(&run.writer, {});
 
     // Not pre-boot, so the OS Logs category stands as in an ordinary run.
-    EXPECT_EQ(kDefaultRun, run.writer.Transcript());
+    EXPECT_EQ(kDeltaRun, run.writer.Transcript());
+    EXPECT_TRUE(run.log.Contains("TWriter::Generator_Environmentals -- Under DELTA mode [Do nothing]"));
+    EXPECT_TRUE(run.log.Contains("TWriter::Generator_OSLogs -- Under DELTA mode [Do Nothing]"));
     EXPECT_TRUE(FixupsRun(run.log).empty());
     EXPECT_TRUE(run.log.Contains("TReport::TReport -- Generation mode is DELTA "));
     EXPECT_TRUE(run.log.Contains("TReport::Write -- Under DELTA mode, don't invok fixing functions"));

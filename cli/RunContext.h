@@ -1,0 +1,34 @@
+// What the report and page commands share: the context map a report is
+// written under, the options that set it, and the log.
+#pragma once
+
+#include <map>
+#include <string>
+
+#include "Commands.h"
+#include "tkrcore/TCIMValue.h"
+
+namespace CLI {
+class App;
+}
+
+namespace braigrion {
+namespace cli {
+
+typedef std::map<std::string, NORVTKR20::TCIMValue> TContextMap;
+
+// Adds --mode, --kmc, --vcx, --log and --log-level.
+void AddRunOptions(CLI::App& command, TRunOptions& options);
+
+// "mode" is "luz" or "default"; "KMC" is "TRUE" or "FALSE"; "VCX" stands
+// only when --vcx is given ("TRUE"), because the report lets "VCX" overrule
+// "KMC" whenever both are present.
+TContextMap MakeContext(const TRunOptions& options);
+
+// Points the core log at the file of --log, at the level of --log-level;
+// without a file, a level sends the log to standard error, and without
+// either the log is off. Throws TInputError when the file cannot be opened.
+void SetUpLog(const TRunOptions& options);
+
+}  // namespace cli
+}  // namespace braigrion

@@ -1,0 +1,194 @@
+// Generators of the hardware pages: inventory, PCI, firmware, service
+// processor, sensors, storage controllers and adapters.
+//
+// A call of NotYetGenerated stands for one page whose definition or section
+// writer is not part of the library yet; the comment beside it names the
+// call that replaces it.
+#include <cctype>
+#include <cstdlib>
+
+#include "braigrion/ReportDefinition.h"
+#include "braigrion/TWriter.h"
+#include "GeneratorSupport.h"
+
+namespace braigrion {
+
+using namespace generators;
+
+void TWriter::Generator_HardwareInventory(TBuilderPtr /*builder*/, std::string pageID) {
+    WriteOrCompare(
+        "TWriter::Generator_HardwareInventory", fProviderType == kDeltaProviderType,
+        [&] { NotYetGenerated(pageID); },   // WriteGenericReport(builder->BuildHardwareInfoParams())
+        [&] { NotYetGenerated(pageID); });  // WriteGenericDeltaReport(builder->BuildHardwareInfoParams())
+}
+
+// In LUZ mode an HTML report has a raw-data page beside the PCI page, and
+// the PCI page links to it.
+void TWriter::Generator_PCIInformation(TBuilderPtr /*builder*/, std::string pageID) {
+    const bool withRawData = fMode == "luz" && fWriterType == TKR_REPORT_DEFINITION::TKR_WRITER_TYPE_HTML;
+    WriteOrCompare(
+        "TWriter::Generator_PCIInformation", fProviderType == kDeltaProviderType,
+        [&] {
+            // params = builder->BuildPCIInfoParams()
+            if (withRawData) {
+                NotYetGenerated(pageID);  // link = WritePCIRawDataReport(params.GetLinkName())
+                NotYetGenerated(pageID);  // WriteGenericReportWithLink(params, link)
+            } else {
+                NotYetGenerated(pageID);  // WriteGenericReport(params)
+            }
+        },
+        [&] { NotYetGenerated(pageID); });  // WriteGenericDeltaReport(builder->BuildPCIInfoParams())
+}
+
+void TWriter::Generator_FirmwareVPD(TBuilderPtr /*builder*/, std::string pageID) {
+    WriteOrCompare(
+        "TWriter::Generator_FirmwareVPD", fProviderType == kDeltaProviderType,
+        [&] { NotYetGenerated(pageID); },   // WriteCustomFirmwareReport(builder, pageID)
+        [&] { NotYetGenerated(pageID); });  // WriteGenericDeltaReport(builder->BuildFirmwareParams())
+}
+
+void TWriter::Generator_ServProcConfiguration(TBuilderPtr /*builder*/, std::string pageID) {
+    WriteUnlessDelta("TWriter::Generator_ServProcConfiguration", fProviderType == kDeltaProviderType, [&] {
+        if (fKMC) {
+            NotYetGenerated(pageID);  // WriteKMCConfigReport(builder, pageID)
+        } else {
+            NotYetGenerated(pageID);  // WriteGenericReport(builder->BuildServProcConfigParams())
+        }
+    });
+}
+
+void TWriter::Generator_Environmentals(TBuilderPtr /*builder*/, std::string pageID) {
+    const std::string name = "TWriter::Generator_Environmentals";
+    Trace(name + kEntering);
+    if (fProviderType == kDeltaProviderType) {
+        Trace(name + " -- Under DELTA mode [Do nothing]");
+    } else {
+        NotYetGenerated(pageID);  // WriteEnvironmentalsReport(builder, pageID)
+    }
+    Trace(name + kExiting);
+}
+
+void TWriter::Generator_DriveHealth(TBuilderPtr /*builder*/, std::string pageID) {
+    WriteUnlessDelta("TWriter::Generator_DriveHealth", fProviderType == kDeltaProviderType,
+                     [&] { NotYetGenerated(pageID); });  // WriteDriveHealthReport(builder, pageID)
+}
+
+void TWriter::Generator_LSIController(TBuilderPtr /*builder*/, std::string pageID) {
+    WriteUnlessDelta("TWriter::Generator_LSIController", fProviderType == kDeltaProviderType,
+                     [&] { NotYetGenerated(pageID); });  // WriteLSIReport(builder, pageID)
+}
+
+void TWriter::Generator_LSIIDEController(TBuilderPtr /*builder*/, std::string pageID) {
+    WriteUnlessDelta("TWriter::Generator_LSIIDEController", fProviderType == kDeltaProviderType,
+                     [&] { NotYetGenerated(pageID); });  // WriteLSIIDEReport(builder, pageID)
+}
+
+void TWriter::Generator_Mellanox(TBuilderPtr /*builder*/, std::string pageID) {
+    WriteUnlessDelta("TWriter::Generator_Mellanox", fProviderType == kDeltaProviderType,
+                     [&] { NotYetGenerated(pageID); });  // WriteMellanoxReport(builder, pageID)
+}
+
+void TWriter::Generator_Solarflare(TBuilderPtr /*builder*/, std::string pageID) {
+    WriteUnlessDelta("TWriter::Generator_Solarflare", fProviderType == kDeltaProviderType,
+                     [&] { NotYetGenerated(pageID); });  // WriteSolarflareReport(builder, pageID)
+}
+
+void TWriter::Generator_FusionIO(TBuilderPtr /*builder*/, std::string pageID) {
+    WriteUnlessDelta("TWriter::Generator_FusionIO", fProviderType == kDeltaProviderType,
+                     [&] { NotYetGenerated(pageID); });  // WriteFusionIOReport(builder, pageID)
+}
+
+void TWriter::Generator_PMCRAID(TBuilderPtr /*builder*/, std::string pageID) {
+    WriteUnlessDelta("TWriter::Generator_PMCRAID", fProviderType == kDeltaProviderType,
+                     [&] { NotYetGenerated(pageID); });  // WritePMCReport(builder, pageID)
+}
+
+void TWriter::Generator_Halcyon(TBuilderPtr /*builder*/, std::string pageID) {
+    WriteUnlessDelta("TWriter::Generator_Halcyon", fProviderType == kDeltaProviderType,
+                     [&] { NotYetGenerated(pageID); });  // WriteHalcyonReport(builder, pageID)
+}
+
+void TWriter::Generator_HalcyonLogs(TBuilderPtr /*builder*/, std::string pageID) {
+    WriteUnlessDelta("TWriter::Generator_HalcyonLogs", fProviderType == kDeltaProviderType,
+                     [&] { NotYetGenerated(pageID); });  // WriteHalcyonLogsReport(builder, pageID)
+}
+
+void TWriter::Generator_QLogic(TBuilderPtr /*builder*/, std::string pageID) {
+    WriteUnlessDelta("TWriter::Generator_QLogic", fProviderType == kDeltaProviderType,
+                     [&] { NotYetGenerated(pageID); });  // WriteQLogicReport(builder, pageID)
+}
+
+void TWriter::Generator_Emulex(TBuilderPtr /*builder*/, std::string pageID) {
+    WriteUnlessDelta("TWriter::Generator_Emulex", fProviderType == kDeltaProviderType,
+                     [&] { NotYetGenerated(pageID); });  // WriteEmulexReport(builder, pageID)
+}
+
+void TWriter::Generator_Broadcom(TBuilderPtr /*builder*/, std::string pageID) {
+    WriteUnlessDelta("TWriter::Generator_Broadcom", fProviderType == kDeltaProviderType,
+                     [&] { NotYetGenerated(pageID); });  // WriteGenericReport(builder->BuildBroadcomParams())
+}
+
+void TWriter::Generator_BrocadeAdapter(TBuilderPtr /*builder*/, std::string pageID) {
+    WriteUnlessDelta("TWriter::Generator_BrocadeAdapter", fProviderType == kDeltaProviderType,
+                     [&] { NotYetGenerated(pageID); });  // WriteBrocadeReport(builder, pageID)
+}
+
+void TWriter::Generator_VMwareESXi(TBuilderPtr /*builder*/, std::string pageID) {
+    WriteUnlessDelta("TWriter::Generator_VMwareESXi", fProviderType == kDeltaProviderType,
+                     [&] { NotYetGenerated(pageID); });  // WriteGenericReport(builder->BuildVmware3iParams())
+}
+
+void TWriter::Generator_GlowTrace(TBuilderPtr /*builder*/, std::string pageID) {
+    WriteUnlessDelta("TWriter::Generator_GlowTrace", fProviderType == kDeltaProviderType,
+                     [&] { NotYetGenerated(pageID); });  // WriteGenericReport(builder->BuildGlowTraceParams())
+}
+
+void TWriter::Generator_SelfBIST(TBuilderPtr /*builder*/, std::string pageID) {
+    WriteUnlessDelta("TWriter::Generator_SelfBIST", fProviderType == kDeltaProviderType,
+                     [&] { NotYetGenerated(pageID); });  // WriteGenericReport(builder->BuildBISTParams())
+}
+
+void TWriter::Generator_KMCLicenseKey(TBuilderPtr /*builder*/, std::string pageID) {
+    const std::string name = "TWriter::Generator_KMCLicenseKey";
+    if (!fKMC) {
+        Trace(name + kEntering);
+        Trace(name + " -- Under Non-KMC system, No KMC License Key");
+        Trace(name + kExiting);
+        return;
+    }
+    WriteUnlessDelta(name, fProviderType == kDeltaProviderType,
+                     [&] { NotYetGenerated(pageID); });  // WriteGenericReport(builder->BuildKMCLicenseKeyParams())
+}
+
+// The BIOS settings page exists only when its collector was switched on
+// through the environment: TKR_BIOSPROVIDER reads "yes" in any case.
+void TWriter::Generator_BIOSSettings(TBuilderPtr /*builder*/, std::string pageID) {
+    const std::string name = "TWriter::Generator_BIOSSettings";
+    Trace(name + kEntering);
+    if (fProviderType == kDeltaProviderType) {
+        Trace(name + " -- Uder DELTA mode [Do Nothing]");
+    } else if (const char* provider = std::getenv("TKR_BIOSPROVIDER")) {
+        std::string value(provider);
+        for (char& c : value) c = static_cast<char>(std::tolower(static_cast<unsigned char>(c)));
+        if (value == "yes") NotYetGenerated(pageID);  // WriteBIOSEnumeration(builder, pageID)
+    }
+    Trace(name + kExiting);
+}
+
+void TWriter::Generator_VCX(TBuilderPtr /*builder*/, std::string pageID) {
+    const std::string name = "TWriter::Generator_VCX";
+    Trace(name + kEntering);
+    if (fProviderType == kDeltaProviderType) {
+        Trace(name + " -- Under DELTA mode [Do Nothing, Not Support]");
+    } else {
+        NotYetGenerated(pageID);  // WriteVCXReport(builder, pageID)
+    }
+    Trace(name + kExiting);
+}
+
+// Declared for a page that no report asks for; it writes nothing.
+void TWriter::Generator_Diablo(TBuilderPtr /*builder*/, std::string /*pageID*/) {
+    WriteUnlessDelta("TWriter::Generator_Diablo", fProviderType == kDeltaProviderType, [] {});
+}
+
+}  // namespace braigrion

@@ -1,0 +1,174 @@
+// Generators of the log and analysis pages: operating system and service
+// processor logs, the pages of the tool's own service mode, merged logs and
+// devices, patches, file loads, diagnostics and the tool's error log.
+//
+// A call of NotYetGenerated stands for one page whose definition or section
+// writer is not part of the library yet; the comment beside it names the
+// call that replaces it.
+#include "braigrion/ReportDefinition.h"
+#include "braigrion/TWriter.h"
+#include "GeneratorSupport.h"
+
+namespace braigrion {
+
+using namespace generators;
+
+namespace {
+
+const char kLuzMode[] = "luz";
+
+}  // namespace
+
+void TWriter::Generator_OSLogs(TBuilderPtr /*builder*/, std::string pageID) {
+    const std::string name = "TWriter::Generator_OSLogs";
+    Trace(name + kEntering);
+    if (fPreboot) {
+        Trace(name + " -- Under pTKR, no OS Logs Information needed");
+    } else if (fProviderType == kDeltaProviderType) {
+        Trace(name + kDeltaDoNothing);
+    } else if (fOSType == TReportParametersBuilder::kOSWindows ||
+               fOSType == TReportParametersBuilder::kOSWindowsServer) {
+        NotYetGenerated(pageID);  // WriteWindowsEventReport(builder, pageID)
+    } else if (fOSType == TReportParametersBuilder::kOSLinux || fOSType == TReportParametersBuilder::kOSVMwareESX) {
+        NotYetGenerated(pageID);  // WriteLinuxLogReport(builder, pageID)
+    } else {
+        Trace(name + " -- Unkown OS Type");
+    }
+    Trace(name + kExiting);
+}
+
+// The service processor's logs. The system inventory of pre-boot data
+// shows them in every mode, delta included.
+void TWriter::Generator_ServProcEvent(TBuilderPtr /*builder*/, std::string pageID) {
+    const std::string name = "TWriter::Generator_ServProcEvent";
+    Trace(name + kEntering);
+    if (fPreboot && fWriterType == TKR_REPORT_DEFINITION::TKR_WRITER_TYPE_INVENTORY) {
+        Trace(name + " -- Under pTKR GUI System Inventory mode");
+        if (!fKMC) {
+            NotYetGenerated(pageID);  // WriteGenericReport(builder->BuildDLMLogParams())
+            NotYetGenerated(pageID);  // WriteGenericReport(builder->BuildZEPHLogParams())
+            NotYetGenerated(pageID);  // WriteIPMIReport(builder->BuildIPMILogParams())
+            NotYetGenerated(pageID);  // WriteGenericReport(builder->BuildMergeLogParams())
+        } else {
+            NotYetGenerated(pageID);  // WriteGenericReport(builder->BuildIPMILogKMCParams())
+            NotYetGenerated(pageID);  // WriteCustomChassisEventLog(builder, pageID)
+        }
+    } else if (fProviderType == kDeltaProviderType) {
+        Trace(name + kDeltaDoNothing);
+    } else if (!fKMC) {
+        NotYetGenerated(pageID);  // WriteGenericReport(builder->BuildDLMLogParams())
+        NotYetGenerated(pageID);  // WriteGenericReport(builder->BuildZEPHLogParams())
+        NotYetGenerated(pageID);  // WriteCustomChassisEventLog(builder, pageID)
+    } else {
+        NotYetGenerated(pageID);  // WriteIPMIReport(builder->BuildIPMILogParams())
+    }
+    Trace(name + kExiting);
+}
+
+// The pages of the service mode exist in LUZ mode only.
+
+void TWriter::Generator_QVAChipsetRegister(TBuilderPtr /*builder*/, std::string pageID) {
+    const std::string name = "TWriter::Generator_QVAChipsetRegister";
+    Trace(name + kEntering);
+    if (fMode == kLuzMode) {
+        if (fProviderType == kDeltaProviderType) {
+            Trace(name + kDeltaDoNothing);
+        } else {
+            NotYetGenerated(pageID);  // WriteQVARegisterReport(builder, pageID)
+        }
+    }
+    Trace(name + kExiting);
+}
+
+void TWriter::Generator_CFTSetting(TBuilderPtr /*builder*/, std::string pageID) {
+    const std::string name = "TWriter::Generator_CFTSetting";
+    Trace(name + kEntering);
+    if (fMode == kLuzMode) {
+        if (fProviderType == kDeltaProviderType) {
+            Trace(name + kDeltaDoNothing);
+        } else {
+            NotYetGenerated(pageID);  // WriteCFTSettingReport(builder, pageID)
+        }
+    }
+    Trace(name + kExiting);
+}
+
+void TWriter::Generator_NVSMILog(TBuilderPtr /*builder*/, std::string pageID) {
+    const std::string name = "TWriter::Generator_NVSMILog";
+    Trace(name + kEntering);
+    if (fMode == kLuzMode) {
+        if (fProviderType == kDeltaProviderType) {
+            // This generator's delta line names the settings page, as it always has.
+            Trace(std::string("TWriter::Generator_CFTSetting") + kDeltaDoNothing);
+        } else {
+            NotYetGenerated(pageID);  // WriteNVSMILogReport(builder, pageID)
+        }
+    }
+    Trace(name + kExiting);
+}
+
+void TWriter::Generator_AMDAticonfigLog(TBuilderPtr /*builder*/, std::string pageID) {
+    const std::string name = "TWriter::Generator_AMDAticonfigLog";
+    Trace(name + kEntering);
+    if (fMode == kLuzMode) {
+        if (fProviderType == kDeltaProviderType) {
+            Trace(name + kDeltaDoNothing);
+        } else {
+            NotYetGenerated(pageID);  // WriteAMDAticonfigLogReport(builder, pageID)
+        }
+    }
+    Trace(name + kExiting);
+}
+
+void TWriter::Generator_SPINTLog(TBuilderPtr /*builder*/, std::string pageID) {
+    const std::string name = "TWriter::Generator_SPINTLog";
+    Trace(name + kEntering);
+    if (fMode == kLuzMode) {
+        if (fProviderType == kDeltaProviderType) {
+            Trace(name + kDeltaDoNothing);
+        } else {
+            NotYetGenerated(pageID);  // WriteGenericReport(builder->BuildSPINTParams())
+        }
+    }
+    Trace(name + kExiting);
+}
+
+void TWriter::Generator_MergedLog(TBuilderPtr /*builder*/, std::string pageID) {
+    WriteUnlessDelta("TWriter::Generator_MergedLog", fProviderType == kDeltaProviderType,
+                     [&] { NotYetGenerated(pageID); });  // WriteMergedLogReport(builder, pageID)
+}
+
+// On a Red Hat system (builder->IsRedHat()) the page is left out with the
+// line "TWriter::Generator_MergedDevice -- Do not write Merged Devices under
+// RedHat platform"; that test comes with the section writer.
+void TWriter::Generator_MergedDevice(TBuilderPtr /*builder*/, std::string pageID) {
+    WriteUnlessDelta("TWriter::Generator_MergedDevice", fProviderType == kDeltaProviderType,
+                     [&] { NotYetGenerated(pageID); });  // WriteMergedDevicesReport(builder, pageID)
+}
+
+void TWriter::Generator_Melody(TBuilderPtr /*builder*/, std::string pageID) {
+    WriteUnlessDelta("TWriter::Generator_Melody", fProviderType == kDeltaProviderType,
+                     [&] { NotYetGenerated(pageID); });  // WriteMelodyReport(builder, pageID)
+}
+
+void TWriter::Generator_PatchBeacon(TBuilderPtr /*builder*/, std::string pageID) {
+    WriteUnlessDelta("TWriter::Generator_PatchBeacon", fProviderType == kDeltaProviderType,
+                     [&] { NotYetGenerated(pageID); });  // WriteGenericReport(builder->BuildPBParams())
+}
+
+void TWriter::Generator_FileLoader(TBuilderPtr /*builder*/, std::string pageID) {
+    WriteUnlessDelta("TWriter::Generator_FileLoader", fProviderType == kDeltaProviderType,
+                     [&] { NotYetGenerated(pageID); });  // WriteGenericReport(builder->BuildFileLoaderParams())
+}
+
+void TWriter::Generator_DiagnosticLog(TBuilderPtr /*builder*/, std::string pageID) {
+    WriteUnlessDelta("TWriter::Generator_DiagnosticLog", fProviderType == kDeltaProviderType,
+                     [&] { NotYetGenerated(pageID); });  // WriteCustomDiagnosticLog(builder, pageID)
+}
+
+void TWriter::Generator_TKRErrorLog(TBuilderPtr /*builder*/, std::string pageID) {
+    WriteUnlessDelta("TWriter::Generator_TKRErrorLog", fProviderType == kDeltaProviderType,
+                     [&] { NotYetGenerated(pageID); });  // WriteGenericReport(builder->BuildTKRLogParams())
+}
+
+}  // namespace braigrion

@@ -1,0 +1,129 @@
+// Whole pages of the three back-ends, rendered from the fixture report and
+// compared with the expected files; and what hostile values and names do.
+#include <gtest/gtest.h>
+
+#include <filesystem>
+
+#include "Assets.h"
+#include "THtmlWriter.h"
+#include "TInventoryWriter.h"
+#include "TTextWriter.h"
+#include "backends/BackendFiles.h"
+#include "backends/FixtureReport.h"
+
+namespace braigrion {
+namespace testing {
+namespace {
+
+namespace fs = std::filesystem;
+
+struct TRendered {
+    TScratchDir scratch;
+    std::string report;  // two levels down, so that "../../x" would still land inside the scratch
+    std::string failure;
+};
+
+void Render(backends::TBackendWriter& writer, TRendered& out) {
+    out.report = out.scratch.Path() + "/outer/inner/report";
+    fs::create_directories(out.report);
+    WriteFixtureReport(writer, out.report);
+    out.failure = writer.GetFailure();
+}
+
+const std::set<std::string> kPageStems = {"slots", "Environmentals", "lsi_rawData", "___.._escape", "tkrlog"};
+
+std::set<std::string> WithPrefix(const std::set<std::string>& stems, const std::string& extension) {
+    std::set<std::string> files;
+    for (const std::string& stem : stems) files.insert("outer/inner/report/" + stem + extension);
+    return files;
+}
+
+TEST(HtmlBackend, WritesTheReportDirectoryAsExpected) {
+    backends::THtmlWriter writer;
+    TRendered out;
+    Render(writer, out);
+    ASSERT_EQ("", out.failure);
+
+    std::set<std::string> expected = WithPrefix(kPageStems, ".html");
+    for (const char* file : {"index.html", "navbar.html", "global.css", "tkr_sort.js"})
+        expected.insert(std::string("outer/inner/report/") + file);
+    EXPECT_EQ(expected, FilesUnder(out.scratch.Path())) << "every file inside the report directory, no other";
+
+    std::vector<std::string> pages = {"index", "navbar"};
+    pages.insert(pages.end(), kPageStems.begin(), kPageStems.end());
+    for (const std::string& stem : pages) {
+        SCOPED_TRACE(stem);
+        std::string actual = ReadWholeFile(out.report + "/" + stem + ".html");
+        EXPECT_EQ(ExpectedText("html/" + stem + ".html", actual), actual);
+    }
+    EXPECT_EQ(std::string(backends::assets::kGlobalCss), ReadWholeFile(out.report + "/global.css"));
+    EXPECT_EQ(std::string(backends::assets::kSortScript), ReadWholeFile(out.report + "/tkr_sort.js"));
+}
+
+TEST(TextBackend, WritesTheReportDirectoryAsExpected) {
+    backends::TTextWriter writer;
+    TRendered out;
+    Render(writer, out);
+    ASSERT_EQ("", out.failure);
+
+    std::set<std::string> expected = WithPrefix(kPageStems, ".txt");
+    expected.insert("outer/inner/report/index.txt");
+    EXPECT_EQ(expected, FilesUnder(out.scratch.Path()));
+
+    std::vector<std::string> pages = {"index"};
+    pages.insert(pages.end(), kPageStems.begin(), kPageStems.end());
+    for (const std::string& stem : pages) {
+        SCOPED_TRACE(stem);
+        std::string actual = ReadWholeFile(out.report + "/" + stem + ".txt");
+        EXPECT_EQ(ExpectedText("text/" + stem + ".txt", actual), actual);
+    }
+}
+
+TEST(InventoryBackend, GivesThePageJustWrittenAndWritesNoFile) {
+    backends::TInventoryWriter writer;
+    TScratchDir scratch;
+    writer.Initialize(boost::shared_ptr<NORVTKR20::ICIMNamespace>(), {}, scratch.Path());
+    WriteFixturePage(writer, scratch.Path());
+    std::string page = writer.GetInventoryPage();
+    EXPECT_EQ(ExpectedText("inventory/slots.html", page), page);
+    EXPECT_TRUE(FilesUnder(scratch.Path()).empty());
+    EXPECT_EQ("", writer.GetInventoryPage()) << "the page is handed over once";
+    EXPECT_EQ("inventory", writer.GetWriterType());
+}
+
+// Whatever the fixture's hostile values and names became, in every page.
+TEST(HtmlBackend, HostileValuesStayTextAndLinksStayInside) {
+    backends::THtmlWriter writer;
+    TRendered out;
+    Render(writer, out);
+    for (const std::string& file : FilesUnder(out.report)) {
+        if (file.size() < 5 || file.substr(file.size() - 5) != ".html") continue;
+        SCOPED_TRACE(file);
+        std::string page = ReadWholeFile(out.report + "/" + file);
+        EXPECT_EQ(std::string::npos, page.find("<script>alert")) << "a value became a script";
+        EXPECT_EQ(std::string::npos, page.find("<img")) << "a value became an element";
+        EXPECT_EQ(std::string::npos, page.find("<b>")) << "a page name became mark-up";
+        EXPECT_EQ(std::string::npos, page.find("href=\"javascript:")) << "a link runs script";
+        EXPECT_EQ(std::string::npos, page.find("href=\"../")) << "a link leaves the report";
+        EXPECT_EQ(std::string::npos, page.find("&amp;lt;")) << "a value was escaped twice";
+    }
+    std::string slots = ReadWholeFile(out.report + "/slots.html");
+    EXPECT_NE(std::string::npos, slots.find("&lt;script&gt;alert(1)&lt;/script&gt;"));
+    EXPECT_NE(std::string::npos, slots.find("a &quot;quoted&quot; &amp; &#39;single&#39; value"));
+    std::string raw = ReadWholeFile(out.report + "/lsi_rawData.html");
+    EXPECT_NE(std::string::npos, raw.find("<a href=\"LSI_RawData_Rresults_0.txt\">View Results</a>"))
+        << "the logic's own link to a result file stays a link";
+    EXPECT_NE(std::string::npos, raw.find("<a class=\"switch\" href=\"lsi_mir.html\"> - [Show Standard Report]</a>"));
+}
+
+TEST(HtmlBackend, AFailureToWriteIsReported) {
+    backends::THtmlWriter writer;
+    TScratchDir scratch;
+    std::string missing = scratch.Path() + "/not-there";
+    WriteFixtureReport(writer, missing);
+    EXPECT_NE(std::string::npos, writer.GetFailure().find(missing + "/slots.html")) << writer.GetFailure();
+}
+
+}  // namespace
+}  // namespace testing
+}  // namespace braigrion

@@ -1,0 +1,160 @@
+// braigrion report and braigrion page as a user meets them: the report
+// directory, its replacement, and every way the commands refuse.
+#include <gtest/gtest.h>
+
+#include <sys/stat.h>
+#include <unistd.h>
+
+#include <algorithm>
+#include <filesystem>
+#include <fstream>
+#include <regex>
+#include <sstream>
+
+#include "CommandRunner.h"
+
+namespace fs = std::filesystem;
+
+namespace {
+
+std::vector<std::string> SampleFiles() {
+    std::string dir = std::string(BRAIGRION_SOURCE_DIR) + "/samples/linux-server/";
+    return {dir + "schema.xml", dir + "inventory.xml", dir + "logs.xml"};
+}
+
+std::vector<std::string> Args(std::vector<std::string> head, const std::vector<std::string>& tail) {
+    head.insert(head.end(), tail.begin(), tail.end());
+    return head;
+}
+
+// A directory of its own for each test, removed afterwards.
+class ReportCommand : public ::testing::Test {
+protected:
+    void SetUp() override {
+        fDir = fs::path(::testing::TempDir()) / ("braigrion_report_" + std::to_string(getpid()));
+        fs::remove_all(fDir);
+        fs::create_directories(fDir);
+    }
+    void TearDown() override { fs::remove_all(fDir); }
+
+    std::string Path(const std::string& name) const { return (fDir / name).string(); }
+    std::string Write(const std::string& name, const std::string& text) const {
+        std::ofstream(Path(name)) << text;
+        return Path(name);
+    }
+    // What lies beside the report: nothing but what the test put there.
+    std::vector<std::string> Entries() const {
+        std::vector<std::string> names;
+        for (const auto& entry : fs::directory_iterator(fDir)) names.push_back(entry.path().filename().string());
+        std::sort(names.begin(), names.end());
+        return names;
+    }
+
+    fs::path fDir;
+};
+
+std::string Slurp(const std::string& path) {
+    std::ifstream in(path);
+    std::ostringstream text;
+    text << in.rdbuf();
+    return text.str();
+}
+
+int Lines(const std::string& text) {
+    return static_cast<int>(std::count(text.begin(), text.end(), '\n'));
+}
+
+TEST_F(ReportCommand, WritesAnHtmlReportAndPrintsItsIndex) {
+    TCommandResult r = RunBraigrion(Args({"report", "-o", Path("report")}, SampleFiles()));
+    ASSERT_EQ(0, r.fStatus) << r.fErr;
+    EXPECT_EQ(Path("report") + "/index.html\n", r.fOut);
+    EXPECT_EQ("", r.fErr) << "no progress when standard error is not a terminal";
+    for (const char* file : {"index.html", "navbar.html", "global.css", "tkr_sort.js", ".braigrion-report"}) {
+        EXPECT_TRUE(fs::is_regular_file(Path("report") + "/" + file)) << file;
+    }
+    EXPECT_EQ(std::vector<std::string>{"report"}, Entries()) << "no work directory is left beside it";
+}
+
+TEST_F(ReportCommand, ReplacesAnEarlierReportAndOnlyThat) {
+    // An earlier report is replaced whole.
+    ASSERT_EQ(0, RunBraigrion(Args({"report", "-o", Path("report")}, SampleFiles())).fStatus);
+    Write("report/stale.html", "from an earlier run");
+    TCommandResult text = RunBraigrion(Args({"report", "--format", "text", "-o", Path("report")}, SampleFiles()));
+    ASSERT_EQ(0, text.fStatus) << text.fErr;
+    EXPECT_EQ(Path("report") + "/index.txt\n", text.fOut);
+    EXPECT_FALSE(fs::exists(Path("report/stale.html")));
+    EXPECT_FALSE(fs::exists(Path("report/index.html")));
+    EXPECT_TRUE(fs::exists(Path("report/index.txt")));
+
+    // A directory of something else is refused, untouched, unless forced.
+    fs::create_directories(Path("photos"));
+    Write("photos/holiday.jpg", "not a report");
+    TCommandResult refused = RunBraigrion(Args({"report", "-o", Path("photos")}, SampleFiles()));
+    EXPECT_EQ(2, refused.fStatus);
+    EXPECT_NE(std::string::npos, refused.fErr.find("is not a braigrion report; use --force")) << refused.fErr;
+    EXPECT_EQ("not a report", Slurp(Path("photos/holiday.jpg")));
+    TCommandResult forced = RunBraigrion(Args({"report", "--force", "-o", Path("photos")}, SampleFiles()));
+    EXPECT_EQ(0, forced.fStatus) << forced.fErr;
+    EXPECT_FALSE(fs::exists(Path("photos/holiday.jpg")));
+
+    // An empty directory is taken as it is.
+    fs::create_directories(Path("empty"));
+    EXPECT_EQ(0, RunBraigrion(Args({"report", "-o", Path("empty/")}, SampleFiles())).fStatus);
+    EXPECT_TRUE(fs::exists(Path("empty/index.html")));
+    EXPECT_EQ((std::vector<std::string>{"empty", "photos", "report"}), Entries());
+}
+
+TEST_F(ReportCommand, RefusesWithOneLineAndTheRightStatus) {
+    ASSERT_EQ(0, RunBraigrion(Args({"report", "-o", Path("earlier")}, SampleFiles())).fStatus);
+    std::string earlierIndex = Slurp(Path("earlier/index.html"));
+    std::string malformed = Write("broken.xml",
+                                  "<?xml version=\"1.0\"?>\n<CIM CIMVERSION=\"2.0\" DTDVERSION=\"2.0\">\n"
+                                  "<DECLARATION><DECLGROUP>\n  <VALUE.OBJECT><INSTANCE CLASSNAME=\"X\">\n"
+                                  "  </DECLGROUP>\n</CIM>\n");
+    Write("a-file", "a file where a directory should be");
+    struct Case {
+        std::vector<std::string> args;
+        int status;
+        std::string saying;  // a regular expression the one line must contain
+    } cases[] = {
+        {Args({"report"}, SampleFiles()), 2, "--output is required"},
+        {Args({"report", "-o", Path("x"), "--format", "pdf"}, SampleFiles()), 2, "pdf"},
+        {Args({"report", "-o", Path("x"), "--mode", "fast"}, SampleFiles()), 2, "fast"},
+        {Args({"report", "-o", Path("x"), "--log-level", "9"}, SampleFiles()), 2, "9"},
+        {Args({"report", "-o", Path("earlier")}, {malformed}), 2, "broken\\.xml:[0-9]+:[0-9]+: "},
+        {Args({"report", "-o", Path("new")}, {malformed}), 2, "broken\\.xml:[0-9]+:[0-9]+: "},
+        {Args({"report", "-o", Path("new")}, {Path("missing.xml")}), 2, "missing\\.xml: no such file"},
+        {Args({"report", "-o", Path("a-file")}, SampleFiles()), 2, "a-file: exists and is not a directory"},
+        {Args({"report", "-o", Path("a-file/report")}, SampleFiles()), 1, "a-file/report: "},
+        {Args({"report", "-o", "/proc/braigrion-report"}, SampleFiles()), 1, "cannot create the report"},
+        {Args({"report", "-o", Path("new"), "--log", Path("no/such/dir/log")}, SampleFiles()), 2,
+         "cannot open the log file"},
+        {Args({"page", "NoSuchPage"}, SampleFiles()), 2, "unknown page id 'NoSuchPage'"},
+        // A page of the service mode writes nothing in the default mode.
+        {Args({"page", "CFTSetting"}, SampleFiles()), 1, "page CFTSetting has nothing to show .* in default mode"},
+        {Args({"page", "SystemConfig"}, {malformed}), 2, "broken\\.xml:[0-9]+:[0-9]+: "},
+    };
+    for (const Case& c : cases) {
+        SCOPED_TRACE(c.saying);
+        TCommandResult r = RunBraigrion(c.args);
+        EXPECT_EQ(c.status, r.fStatus);
+        EXPECT_TRUE(std::regex_search(r.fErr, std::regex(c.saying))) << r.fErr;
+        EXPECT_EQ(1, Lines(r.fErr)) << "one line on stderr:\n" << r.fErr;
+        EXPECT_EQ("", r.fOut);
+    }
+    // Nothing was created, and the earlier report stands as it was.
+    EXPECT_EQ((std::vector<std::string>{"a-file", "broken.xml", "earlier"}), Entries());
+    EXPECT_EQ(earlierIndex, Slurp(Path("earlier/index.html")));
+}
+
+TEST_F(ReportCommand, EveryCommandHasHelp) {
+    for (const char* command : {"report", "page", "info"}) {
+        TCommandResult r = RunBraigrion({command, "--help"});
+        EXPECT_EQ(0, r.fStatus) << command;
+        EXPECT_NE(std::string::npos, r.fOut.find("Usage")) << r.fOut;
+    }
+    TCommandResult page = RunBraigrion({"page", "--help"});
+    EXPECT_NE(std::string::npos, page.fOut.find("SystemConfig")) << "the page ids are listed";
+}
+
+}  // namespace
