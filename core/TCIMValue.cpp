@@ -15,12 +15,28 @@ namespace NORVTKR20 {
 typedef TCIMValue::TCIMType::ECIMType ECIMType;
 typedef TCIMValue::TCIMType TType;
 
-// The heavier kinds live out of line so that the common value stays small.
+// The heavier kinds live out of line so that the common value stays small;
+// each kind allocates only what it holds.
 struct TCIMValue::TPayload {
-    TCIMDateTime fDateTime;
-    TCIMReference fReference;
-    std::vector<TCIMValue> fArray;
+    virtual ~TPayload() {}
+    virtual TPayload* Clone() const = 0;
 };
+
+namespace {
+
+template <typename T>
+struct THolder : TCIMValue::TPayload {
+    explicit THolder(T item) : fItem(std::move(item)) {}
+    TCIMValue::TPayload* Clone() const override { return new THolder(fItem); }
+    T fItem;
+};
+
+template <typename T>
+T& Item(const std::unique_ptr<TCIMValue::TPayload>& payload) {
+    return static_cast<THolder<T>*>(payload.get())->fItem;
+}
+
+}  // namespace
 
 namespace {
 
@@ -152,20 +168,18 @@ TCIMValue::TCIMValue(unsigned int value) : fType(TType::eUint32), fIsArray(false
 TCIMValue::TCIMValue(unsigned short value) : fType(TType::eUint16), fIsArray(false), fIsNull(false) { fNum.u = value; }
 
 TCIMValue::TCIMValue(const TCIMDateTime& value)
-    : fType(TType::eDateTime), fIsArray(false), fIsNull(false), fPayload(new TPayload()) {
+    : fType(TType::eDateTime), fIsArray(false), fIsNull(false), fPayload(new THolder<TCIMDateTime>(value)) {
     fNum.u = 0;
-    fPayload->fDateTime = value;
 }
 
 TCIMValue::TCIMValue(const TCIMReference& value)
-    : fType(TType::eReference), fIsArray(false), fIsNull(false), fPayload(new TPayload()) {
+    : fType(TType::eReference), fIsArray(false), fIsNull(false), fPayload(new THolder<TCIMReference>(value)) {
     fNum.u = 0;
-    fPayload->fReference = value;
 }
 
 TCIMValue::TCIMValue(const TCIMValue& o)
     : fType(o.fType), fIsArray(o.fIsArray), fIsNull(o.fIsNull), fNum(o.fNum), fText(o.fText),
-      fPayload(o.fPayload ? new TPayload(*o.fPayload) : nullptr) {}
+      fPayload(o.fPayload ? o.fPayload->Clone() : nullptr) {}
 
 TCIMValue::TCIMValue(TCIMValue&& o) noexcept
     : fType(o.fType), fIsArray(o.fIsArray), fIsNull(o.fIsNull), fNum(o.fNum), fText(std::move(o.fText)),
@@ -248,8 +262,7 @@ TCIMValue TCIMValue::Array(ECIMType elementType, std::vector<TCIMValue> elements
     v.fType = static_cast<std::uint8_t>(elementType);
     v.fIsArray = true;
     v.fIsNull = false;
-    v.fPayload.reset(new TPayload());
-    v.fPayload->fArray = std::move(elements);
+    v.fPayload.reset(new THolder<std::vector<TCIMValue>>(std::move(elements)));
     return v;
 }
 
@@ -314,15 +327,15 @@ TCIMValue TCIMValue::FromText(ECIMType type, const std::string& text) {
 bool TCIMValue::operator==(const TCIMValue& o) const {
     if (fType != o.fType || fIsArray != o.fIsArray || fIsNull != o.fIsNull) return false;
     if (fIsNull) return true;
-    if (fIsArray) return fPayload->fArray == o.fPayload->fArray;
+    if (fIsArray) return Item<std::vector<TCIMValue>>(fPayload) == Item<std::vector<TCIMValue>>(o.fPayload);
     switch (fType) {
         case TType::eBoolean: return fNum.b == o.fNum.b;
         case TType::eReal32:
         case TType::eReal64: return fNum.d == o.fNum.d;
         case TType::eString:
         case TType::eChar16: return fText == o.fText;
-        case TType::eDateTime: return fPayload->fDateTime == o.fPayload->fDateTime;
-        case TType::eReference: return fPayload->fReference == o.fPayload->fReference;
+        case TType::eDateTime: return Item<TCIMDateTime>(fPayload) == Item<TCIMDateTime>(o.fPayload);
+        case TType::eReference: return Item<TCIMReference>(fPayload) == Item<TCIMReference>(o.fPayload);
         default: return fNum.u == o.fNum.u;
     }
 }
@@ -410,7 +423,7 @@ TCIMValue::operator std::string() const { return ToString(10); }
 
 TCIMValue::operator TCIMDateTime() const {
     RequireScalar();
-    if (fType == TType::eDateTime) return fPayload->fDateTime;
+    if (fType == TType::eDateTime) return Item<TCIMDateTime>(fPayload);
     if (IsTextType(fType)) {
         TCIMDateTime dt;
         if (TCIMDateTime::Parse(Trim(fText), dt)) return dt;
@@ -420,7 +433,7 @@ TCIMValue::operator TCIMDateTime() const {
 
 TCIMValue::operator TCIMReference() const {
     RequireScalar();
-    if (fType == TType::eReference) return fPayload->fReference;
+    if (fType == TType::eReference) return Item<TCIMReference>(fPayload);
     if (IsTextType(fType)) {
         TCIMReference ref;
         if (TCIMReference::ParsePath(fText, ref)) return ref;
@@ -431,7 +444,7 @@ TCIMValue::operator TCIMReference() const {
 TCIMValue::operator std::vector<TCIMValue>&() const {
     if (!fIsArray) Fail(kTypeMismatch);
     if (!fPayload) Fail(kNullValue);
-    return fPayload->fArray;
+    return Item<std::vector<TCIMValue>>(fPayload);
 }
 
 std::string TCIMValue::ToString(unsigned char radix) const {
@@ -439,7 +452,7 @@ std::string TCIMValue::ToString(unsigned char radix) const {
     if (fIsArray) {
         std::string out;
         bool first = true;
-        for (const TCIMValue& e : fPayload->fArray) {
+        for (const TCIMValue& e : Item<std::vector<TCIMValue>>(fPayload)) {
             if (!first) out += ',';
             first = false;
             out += e.ToString(radix);
@@ -452,8 +465,8 @@ std::string TCIMValue::ToString(unsigned char radix) const {
         case TType::eReal64: return FormatReal(fNum.d, false);
         case TType::eString:
         case TType::eChar16: return fText;
-        case TType::eDateTime: return fPayload->fDateTime.ToCIMString();
-        case TType::eReference: return fPayload->fReference.GetPath();
+        case TType::eDateTime: return Item<TCIMDateTime>(fPayload).ToCIMString();
+        case TType::eReference: return Item<TCIMReference>(fPayload).GetPath();
         default: break;
     }
     if (IsSignedType(fType)) return FormatSigned(fNum.i, radix);

@@ -103,8 +103,10 @@ public:
     // elements with ","; null gives "".
     std::string ToString(unsigned char radix) const;
 
-private:
+    // The out-of-line part of a date-time, reference or array value.
     struct TPayload;
+
+private:
 
     void ClearPayload();
     const TCIMValue& RequireScalar() const;
