@@ -56,9 +56,11 @@ int RunReport(const TReportOptions& options, std::ostream& out, std::ostream& er
 
     TContextMap context = MakeContext(options.fRun);
     TReport report(loaded.fNamespace, context, directory.WorkPath());
-    TReportParametersBuilder builder(loaded.fNamespace, report.GetMode(), report.IsKMC());
     {
-        TProgressLog progress(err, PlannedPages(report, builder).size(), progressToErr && !options.fQuiet);
+        TProgressLine progress(err, progressToErr && !options.fQuiet);
+        report.SetPageObserver([&progress](size_t number, size_t total, const std::string& page) {
+            progress.Page(number, total, page);
+        });
         report.Write(writer.get(), context);
     }
     if (!writer->GetFailure().empty()) throw std::runtime_error(writer->GetFailure());

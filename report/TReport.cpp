@@ -51,10 +51,6 @@ std::string ContextText(const TReport::TContext& context, const std::string& key
     return found ? static_cast<std::string>(it->second) : std::string();
 }
 
-void WritePages(TWriter* writer, const boost::shared_ptr<TReportParametersBuilder>& builder,
-                const std::vector<std::string>& pages) {
-    for (const std::string& page : pages) writer->WriteReportPage(builder, page);
-}
 
 void StartCategoryLog(const std::string& name) {
     Trace("TReport::Write -- Start generating category [" + name + "]");
@@ -155,71 +151,108 @@ void TReport::Write(TWriter* writer, TContext context) {
     Trace("TReport::Write -- Exiting");
 }
 
-void TReport::WriteCategories(TWriter* writer, const boost::shared_ptr<TReportParametersBuilder>& builder) {
-    StartCategoryLog(CATEGORY_SOFTWARE);
-    writer->StartReport();
-    writer->WriteCategory(CATEGORY_SOFTWARE);
-    WritePages(writer, builder,
-               {PAGE_SYSTEM_OVERVIEW, PAGE_OS_INSTALLATIONS, PAGE_NETWORK_SETTINGS, PAGE_RESOURCE_UTILIZATION,
-                PAGE_PROCESS_INFORMATION, PAGE_OS_CONFIGURATION});
+// One step of a report's walk. The walk is planned first, then carried out,
+// so that the pages it will ask for can be counted before it starts.
+struct TReport::TStep {
+    enum EKind { kCategoryLog, kTrace, kError, kStartReport, kWriteCategory, kEndCategory, kPage };
+    EKind fKind;
+    std::string fText;
+};
 
-    StartCategoryLog(CATEGORY_HARDWARE);
-    writer->EndCategory();
-    writer->WriteCategory(CATEGORY_HARDWARE);
-    WritePages(writer, builder,
-               {PAGE_HARDWARE_INVENTORY, PAGE_PCI_INFORMATION, PAGE_FIRMWARE_VPD, PAGE_SERV_PROC_CONFIGURATION,
-                PAGE_ENVIRONMENTALS, PAGE_DRIVE_HEALTH, PAGE_LSI_CONTROLLER, PAGE_LSI_IDE_CONTROLLER, PAGE_MELLANOX,
-                PAGE_SOLARFLARE, PAGE_FUSIONIO, PAGE_PMC_RAID, PAGE_HALCYON, PAGE_HALCYON_LOGS, PAGE_QLOGIC,
-                PAGE_EMULEX, PAGE_BROADCOM, PAGE_BROCADE_ADAPTER, PAGE_VMWARE_ESXI, PAGE_GLOW_TRACE, PAGE_BIST,
-                PAGE_KMC_LICENSE_KEY, PAGE_BIOS_SETTINGS});
-    if (fKMC) writer->WriteReportPage(builder, PAGE_VCX);
+std::vector<TReport::TStep> TReport::PlanCategories(const TReportParametersBuilder& builder) const {
+    std::vector<TStep> plan;
+    auto step = [&](TStep::EKind kind, const std::string& text) { plan.push_back(TStep{kind, text}); };
+    auto pages = [&](std::initializer_list<std::string> ids) {
+        for (const std::string& id : ids) step(TStep::kPage, id);
+    };
+
+    step(TStep::kCategoryLog, CATEGORY_SOFTWARE);
+    step(TStep::kStartReport, "");
+    step(TStep::kWriteCategory, CATEGORY_SOFTWARE);
+    pages({PAGE_SYSTEM_OVERVIEW, PAGE_OS_INSTALLATIONS, PAGE_NETWORK_SETTINGS, PAGE_RESOURCE_UTILIZATION,
+           PAGE_PROCESS_INFORMATION, PAGE_OS_CONFIGURATION});
+
+    step(TStep::kCategoryLog, CATEGORY_HARDWARE);
+    step(TStep::kEndCategory, "");
+    step(TStep::kWriteCategory, CATEGORY_HARDWARE);
+    pages({PAGE_HARDWARE_INVENTORY, PAGE_PCI_INFORMATION, PAGE_FIRMWARE_VPD, PAGE_SERV_PROC_CONFIGURATION,
+           PAGE_ENVIRONMENTALS, PAGE_DRIVE_HEALTH, PAGE_LSI_CONTROLLER, PAGE_LSI_IDE_CONTROLLER, PAGE_MELLANOX,
+           PAGE_SOLARFLARE, PAGE_FUSIONIO, PAGE_PMC_RAID, PAGE_HALCYON, PAGE_HALCYON_LOGS, PAGE_QLOGIC, PAGE_EMULEX,
+           PAGE_BROADCOM, PAGE_BROCADE_ADAPTER, PAGE_VMWARE_ESXI, PAGE_GLOW_TRACE, PAGE_BIST, PAGE_KMC_LICENSE_KEY,
+           PAGE_BIOS_SETTINGS});
+    if (fKMC) step(TStep::kPage, PAGE_VCX);
 
     // Pre-boot data hold no operating system logs. No EndCategory either, so
     // the next category's EndCategory closes "Hardware".
-    StartCategoryLog(CATEGORY_OS_LOGS);
+    step(TStep::kCategoryLog, CATEGORY_OS_LOGS);
     if (fPreboot) {
-        Trace("TReport::Write -- Under pTKR, no OS Logs information needed");
+        step(TStep::kTrace, "TReport::Write -- Under pTKR, no OS Logs information needed");
     } else {
-        writer->EndCategory();
-        int osType = builder->GetOSType();
+        step(TStep::kEndCategory, "");
+        int osType = builder.GetOSType();
         if (osType == 0 || osType == 1) {
-            writer->WriteCategory(CATEGORY_WINDOWS_LOGS);
-            writer->WriteReportPage(builder, PAGE_OS_LOGS);
+            step(TStep::kWriteCategory, CATEGORY_WINDOWS_LOGS);
+            step(TStep::kPage, PAGE_OS_LOGS);
         } else if (osType == 2 || osType == 3) {
-            writer->WriteCategory(CATEGORY_LINUX_LOGS);
-            writer->WriteReportPage(builder, PAGE_OS_LOGS);
+            step(TStep::kWriteCategory, CATEGORY_LINUX_LOGS);
+            step(TStep::kPage, PAGE_OS_LOGS);
         } else {
-            Log(0, "TReport::Write -- Unknow OS type]");
+            step(TStep::kError, "TReport::Write -- Unknow OS type]");
         }
     }
 
-    StartCategoryLog(CATEGORY_SERVPROC_LOGS);
-    writer->EndCategory();
-    writer->WriteCategory(fKMC ? CATEGORY_KMC_LOGS : CATEGORY_SP_LOGS);
-    writer->WriteReportPage(builder, PAGE_SP_LOGS);
+    step(TStep::kCategoryLog, CATEGORY_SERVPROC_LOGS);
+    step(TStep::kEndCategory, "");
+    step(TStep::kWriteCategory, fKMC ? CATEGORY_KMC_LOGS : CATEGORY_SP_LOGS);
+    step(TStep::kPage, PAGE_SP_LOGS);
 
-    StartCategoryLog(CATEGORY_ORV_SERVICE);
+    step(TStep::kCategoryLog, CATEGORY_ORV_SERVICE);
     if (fMode == "luz") {
-        writer->EndCategory();
-        writer->WriteCategory(CATEGORY_ORV_SERVICE);
-        WritePages(writer, builder,
-                   {PAGE_QVA_CHIPSET_REGISTER, PAGE_CFT_SETTING, PAGE_NVSMI_LOG, PAGE_AMDATICONFIG_LOG,
-                    PAGE_SPINT_LOG});
+        step(TStep::kEndCategory, "");
+        step(TStep::kWriteCategory, CATEGORY_ORV_SERVICE);
+        pages({PAGE_QVA_CHIPSET_REGISTER, PAGE_CFT_SETTING, PAGE_NVSMI_LOG, PAGE_AMDATICONFIG_LOG, PAGE_SPINT_LOG});
     } else {
-        Trace("TReport::Write -- Under Non-LUZ (default) mode, no ORV Service information needed");
+        step(TStep::kTrace, "TReport::Write -- Under Non-LUZ (default) mode, no ORV Service information needed");
     }
 
-    StartCategoryLog(CATEGORY_ANALYSIS);
-    writer->EndCategory();
-    writer->WriteCategory(CATEGORY_ANALYSIS);
-    WritePages(writer, builder,
-               {PAGE_MERGED_LOG, PAGE_MERGED_DEVICE, PAGE_MELODY_DEVICE, PAGE_PATCHBEACON, PAGE_FILE_LOADER,
-                PAGE_DIAGNOSTIC});
+    step(TStep::kCategoryLog, CATEGORY_ANALYSIS);
+    step(TStep::kEndCategory, "");
+    step(TStep::kWriteCategory, CATEGORY_ANALYSIS);
+    pages({PAGE_MERGED_LOG, PAGE_MERGED_DEVICE, PAGE_MELODY_DEVICE, PAGE_PATCHBEACON, PAGE_FILE_LOADER,
+           PAGE_DIAGNOSTIC});
 
     // The error log closes the index: its category has no heading of its own.
-    StartCategoryLog(CATEGORY_TKR_ERROR_LOG);
-    writer->EndCategory();
-    writer->WriteReportPage(builder, PAGE_TKR_ERROR_LOGS);
+    step(TStep::kCategoryLog, CATEGORY_TKR_ERROR_LOG);
+    step(TStep::kEndCategory, "");
+    step(TStep::kPage, PAGE_TKR_ERROR_LOGS);
+    return plan;
+}
+
+std::vector<std::string> TReport::PlannedPages(const TReportParametersBuilder& builder) const {
+    std::vector<std::string> pages;
+    for (const TStep& s : PlanCategories(builder))
+        if (s.fKind == TStep::kPage) pages.push_back(s.fText);
+    return pages;
+}
+
+void TReport::WriteCategories(TWriter* writer, const boost::shared_ptr<TReportParametersBuilder>& builder) {
+    const std::vector<TStep> plan = PlanCategories(*builder);
+    size_t total = 0, done = 0;
+    for (const TStep& s : plan) total += s.fKind == TStep::kPage;
+    for (const TStep& s : plan) {
+        switch (s.fKind) {
+            case TStep::kCategoryLog: StartCategoryLog(s.fText); break;
+            case TStep::kTrace: Trace(s.fText); break;
+            case TStep::kError: Log(0, s.fText); break;
+            case TStep::kStartReport: writer->StartReport(); break;
+            case TStep::kWriteCategory: writer->WriteCategory(s.fText); break;
+            case TStep::kEndCategory: writer->EndCategory(); break;
+            case TStep::kPage:
+                if (fPageObserver) fPageObserver(++done, total, s.fText);
+                writer->WriteReportPage(builder, s.fText);
+                break;
+        }
+    }
 }
 
 std::string TReport::GetPage(TWriter* writer, TContext context) {

@@ -5,7 +5,9 @@
 
 #include <map>
 #include <string>
+#include <vector>
 
+#include <boost/function.hpp>
 #include <boost/shared_ptr.hpp>
 
 #include "braigrion/TReportParametersBuilder.h"
@@ -18,6 +20,9 @@ class TWriter;
 class TReport {
 public:
     typedef std::map<std::string, NORVTKR20::TCIMValue> TContext;
+    // Told before each page of Write: its number (from 1), the number of
+    // pages the run will ask for, and the page id.
+    typedef boost::function<void(size_t number, size_t total, const std::string& pageID)> TPageObserver;
 
     // Context keys read: "mode", "KMC", "VCX", "pageID", "viewID", "dataID",
     // "testID". Throws std::invalid_argument for a null namespace.
@@ -29,6 +34,11 @@ public:
     // The page named by the context key "pageID", for an inventory back-end;
     // "" for any other back-end.
     std::string GetPage(TWriter* writer, TContext context);
+
+    void SetPageObserver(TPageObserver observer) { fPageObserver = observer; }
+    // The page ids Write asks for, in order, for this report's flags and the
+    // operating system that `builder` finds.
+    std::vector<std::string> PlannedPages(const TReportParametersBuilder& builder) const;
 
     // Finds the KMC flag from the firmware elements rather than the context.
     // Nothing in the report calls it.
@@ -53,7 +63,9 @@ public:
     bool IsPreboot() const { return fPreboot; }
 
 private:
+    struct TStep;
     boost::shared_ptr<TReportParametersBuilder> MakeBuilder() const;
+    std::vector<TStep> PlanCategories(const TReportParametersBuilder& builder) const;
     void WriteCategories(TWriter* writer, const boost::shared_ptr<TReportParametersBuilder>& builder);
 
     boost::shared_ptr<NORVTKR20::ICIMNamespace> fNamespace;
@@ -67,6 +79,7 @@ private:
     bool fDelta;
     bool fPreboot;
     bool fSpare;
+    TPageObserver fPageObserver;
 };
 
 }  // namespace braigrion

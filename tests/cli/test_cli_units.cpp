@@ -7,12 +7,15 @@
 #include <sys/wait.h>
 #include <unistd.h>
 
+#include <algorithm>
 #include <filesystem>
 #include <fstream>
 #include <sstream>
 
 #include "Progress.h"
 #include "ReportDirectory.h"
+#include "braigrion/TReport.h"
+#include "braigrion/TReportParametersBuilder.h"
 #include "support/RecordingWriter.h"
 #include "support/RepoBuilder.h"
 
@@ -91,9 +94,10 @@ TEST_F(ReportDirectoryTest, AFailedOrInterruptedRunLeavesTheEarlierReport) {
     EXPECT_TRUE(fs::exists(fDir / "report" / TReportDirectory::kMarkerName));
 }
 
-// The progress count follows the pages the driver really asks for, in each
-// mode that changes the sequence.
-TEST(Progress, CountsThePagesTheReportWalks) {
+// The report tells its observer of every page it asks for, numbered against
+// the total it planned, in each mode that changes the sequence; the progress
+// line shows the last of them.
+TEST(Progress, FollowsThePagesTheReportWalks) {
     testing::TRepoBuilder windows;
     windows.Parse(R"(
         ORVSG_OperatingSystem ProductVendor="Microsoft Corporation" OSType=uint16:18
@@ -109,11 +113,12 @@ TEST(Progress, CountsThePagesTheReportWalks) {
         boost::shared_ptr<NORVTKR20::ICIMNamespace> ns;
         std::string mode;
         std::string kmc;
+        bool osLogs;
     } cases[] = {
-        {"windows default", windows.Namespace(), "default", "FALSE"},
-        {"windows luz kmc", windows.Namespace(), "luz", "TRUE"},
-        {"preboot", preboot.Namespace(), "default", "FALSE"},
-        {"unknown os", unknown.Namespace(), "luz", "FALSE"},
+        {"windows default", windows.Namespace(), "default", "FALSE", true},
+        {"windows luz kmc", windows.Namespace(), "luz", "TRUE", true},
+        {"preboot", preboot.Namespace(), "default", "FALSE", false},
+        {"unknown os", unknown.Namespace(), "luz", "FALSE", false},
     };
     for (const Case& c : cases) {
         SCOPED_TRACE(c.name);
@@ -122,16 +127,23 @@ TEST(Progress, CountsThePagesTheReportWalks) {
         context["KMC"] = NORVTKR20::TCIMValue(c.kmc);
         TReport report(c.ns, context, ::testing::TempDir());
         TReportParametersBuilder builder(c.ns, report.GetMode(), report.IsKMC());
-        std::vector<std::string> planned = PlannedPages(report, builder);
+        std::vector<std::string> planned = report.PlannedPages(builder);
+        std::vector<std::string> told;
         std::ostringstream out;
-        testing::TRecordingWriter writer;
-        size_t seen = 0;
         {
-            TProgressLog progress(out, planned.size(), true);
+            TProgressLine progress(out, true);
+            report.SetPageObserver([&](size_t number, size_t total, const std::string& page) {
+                told.push_back(page);
+                EXPECT_EQ(told.size(), number);
+                EXPECT_EQ(planned.size(), total);
+                progress.Page(number, total, page);
+            });
+            testing::TRecordingWriter writer;
             report.Write(&writer, context);
-            seen = progress.PagesSeen();
         }
-        EXPECT_EQ(planned.size(), seen);
+        EXPECT_EQ(planned, told);
+        EXPECT_EQ(c.osLogs, std::count(told.begin(), told.end(), std::string("OSLogs")) == 1);
+        EXPECT_EQ(c.mode == "luz", std::count(told.begin(), told.end(), std::string("SPINTLog")) == 1);
         std::string last = "page " + std::to_string(planned.size()) + " of " + std::to_string(planned.size()) + ": " +
                            planned.back();
         EXPECT_NE(std::string::npos, out.str().find(last)) << out.str();
