@@ -1,9 +1,9 @@
 // Generators of the hardware pages: inventory, PCI, firmware, service
 // processor, sensors, storage controllers and adapters.
 //
-// A call of NotYetGenerated stands for one page whose definition or section
-// writer is not part of the library yet; the comment beside it names the
-// call that replaces it.
+// A call of NotYetGenerated stands for one page whose section writer or
+// delta comparison is not part of the library yet; the comment beside it
+// names the call that replaces it.
 #include <cctype>
 #include <cstdlib>
 
@@ -15,26 +15,28 @@ namespace braigrion {
 
 using namespace generators;
 
-void TWriter::Generator_HardwareInventory(TBuilderPtr /*builder*/, std::string pageID) {
+void TWriter::Generator_HardwareInventory(TBuilderPtr builder, std::string pageID) {
     WriteOrCompare(
         "TWriter::Generator_HardwareInventory", fProviderType == kDeltaProviderType,
-        [&] { NotYetGenerated(pageID); },   // WriteGenericReport(builder->BuildHardwareInfoParams())
+        [&] { WriteGenericReport(builder->BuildHardwareInfoParams()); },
         [&] { NotYetGenerated(pageID); });  // WriteGenericDeltaReport(builder->BuildHardwareInfoParams())
 }
 
 // In LUZ mode an HTML report has a raw-data page beside the PCI page, and
 // the PCI page links to it.
-void TWriter::Generator_PCIInformation(TBuilderPtr /*builder*/, std::string pageID) {
+void TWriter::Generator_PCIInformation(TBuilderPtr builder, std::string pageID) {
     const bool withRawData = fMode == "luz" && fWriterType == TKR_REPORT_DEFINITION::TKR_WRITER_TYPE_HTML;
     WriteOrCompare(
         "TWriter::Generator_PCIInformation", fProviderType == kDeltaProviderType,
         [&] {
-            // params = builder->BuildPCIInfoParams()
+            TReportParameters params = builder->BuildPCIInfoParams();
             if (withRawData) {
-                NotYetGenerated(pageID);  // link = WritePCIRawDataReport(params.GetLinkName())
-                NotYetGenerated(pageID);  // WriteGenericReportWithLink(params, link)
+                // The raw page is written and closed first; without one the
+                // link is "" and the PCI page has no switch.
+                const std::string link = WritePCIRawDataReport(params.GetLinkName());
+                WriteGenericReportWithLink(params, link);
             } else {
-                NotYetGenerated(pageID);  // WriteGenericReport(params)
+                WriteGenericReport(params);
             }
         },
         [&] { NotYetGenerated(pageID); });  // WriteGenericDeltaReport(builder->BuildPCIInfoParams())
@@ -133,9 +135,9 @@ void TWriter::Generator_BrocadeAdapter(TBuilderPtr /*builder*/, std::string page
                      [&] { NotYetGenerated(pageID); });  // WriteBrocadeReport(builder, pageID)
 }
 
-void TWriter::Generator_VMwareESXi(TBuilderPtr /*builder*/, std::string pageID) {
+void TWriter::Generator_VMwareESXi(TBuilderPtr builder, std::string /*pageID*/) {
     WriteUnlessDelta("TWriter::Generator_VMwareESXi", fProviderType == kDeltaProviderType,
-                     [&] { NotYetGenerated(pageID); });  // WriteGenericReport(builder->BuildVmware3iParams())
+                     [&] { WriteGenericReport(builder->BuildVmware3iParams()); });
 }
 
 void TWriter::Generator_GlowTrace(TBuilderPtr /*builder*/, std::string pageID) {

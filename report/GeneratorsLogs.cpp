@@ -151,9 +151,9 @@ void TWriter::Generator_Melody(TBuilderPtr /*builder*/, std::string pageID) {
                      [&] { NotYetGenerated(pageID); });  // WriteMelodyReport(builder, pageID)
 }
 
-void TWriter::Generator_PatchBeacon(TBuilderPtr /*builder*/, std::string pageID) {
+void TWriter::Generator_PatchBeacon(TBuilderPtr builder, std::string /*pageID*/) {
     WriteUnlessDelta("TWriter::Generator_PatchBeacon", fProviderType == kDeltaProviderType,
-                     [&] { NotYetGenerated(pageID); });  // WriteGenericReport(builder->BuildPBParams())
+                     [&] { WriteGenericReport(builder->BuildPBParams()); });
 }
 
 void TWriter::Generator_FileLoader(TBuilderPtr /*builder*/, std::string pageID) {

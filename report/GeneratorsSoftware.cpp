@@ -1,8 +1,11 @@
 // Generators of the software pages: system overview, operating system
 // installation and configuration, network, resources and processes.
 //
-// A call of NotYetGenerated stands for one page whose definition is not part
-// of the library yet; the comment beside it names the call that replaces it.
+// Outside delta mode each page is declared by the builder and written by the
+// generic page writer. In delta mode a page is compared with its counterparts
+// instead; until the comparison is part of the library, a call of
+// NotYetGenerated stands for each compared page, and the comment beside it
+// names the call that replaces it.
 #include "braigrion/ReportDefinition.h"
 #include "braigrion/TWriter.h"
 #include "GeneratorSupport.h"
@@ -23,10 +26,10 @@ bool IsLinux(int osType) {
 
 }  // namespace
 
-void TWriter::Generator_SystemOverview(TBuilderPtr /*builder*/, std::string pageID) {
+void TWriter::Generator_SystemOverview(TBuilderPtr builder, std::string pageID) {
     WriteOrCompare(
         "TWriter::Generator_SystemOverview", fProviderType == kDeltaProviderType,
-        [&] { NotYetGenerated(pageID); },   // WriteGenericReport(builder->BuildSystemConfigParams())
+        [&] { WriteGenericReport(builder->BuildSystemConfigParams()); },
         [&] { NotYetGenerated(pageID); });  // WriteGenericDeltaReport(builder->BuildSystemConfigParams())
 }
 
@@ -46,38 +49,52 @@ void TWriter::Generator_CriticalDetails(TBuilderPtr /*builder*/, std::string pag
 
 // Installed software, and by operating system its components and fixes,
 // drivers and services, or its packages and kernel modules. In delta mode
-// each page is compared (WriteGenericDeltaReport) instead of written.
-void TWriter::Generator_OSInstallation(TBuilderPtr /*builder*/, std::string pageID) {
+// each page is compared instead of written.
+void TWriter::Generator_OSInstallation(TBuilderPtr builder, std::string pageID) {
     const std::string name = "TWriter::Generator_OSInstallation";
+    const bool delta = fProviderType == kDeltaProviderType;
+    typedef TReportParameters (TReportParametersBuilder::*TBuild)() const;
+    // One page of the installation: written, or in delta mode compared
+    // (WriteGenericDeltaReport of the same definition).
+    auto page = [&](TBuild build) {
+        if (delta) {
+            NotYetGenerated(pageID);
+        } else {
+            WriteGenericReport((builder.get()->*build)());
+        }
+    };
     Trace(name + kEntering);
     if (fPreboot) {
         Trace(name + " -- Under pTKR, no OS installation information needed");
     } else {
-        if (fProviderType == kDeltaProviderType) Trace(name + kDeltaDoComparison);
-        NotYetGenerated(pageID);  // builder->BuildInstalledAppsParams()
+        if (delta) Trace(name + kDeltaDoComparison);
+        page(&TReportParametersBuilder::BuildInstalledAppsParams);
         if (IsWindows(fOSType)) {
-            NotYetGenerated(pageID);  // builder->BuildWindowsComponentsParams()
-            NotYetGenerated(pageID);  // builder->BuildInstalledFixesParams()
-            NotYetGenerated(pageID);  // builder->BuildDeviceDriverParams()
-            NotYetGenerated(pageID);  // builder->BuildSystemServiceParams()
+            page(&TReportParametersBuilder::BuildWindowsComponentsParams);
+            page(&TReportParametersBuilder::BuildInstalledFixesParams);
+            page(&TReportParametersBuilder::BuildDeviceDriverParams);
+            page(&TReportParametersBuilder::BuildSystemServiceParams);
         } else if (IsLinux(fOSType)) {
-            NotYetGenerated(pageID);  // builder->BuildInstalledRPMParams()
-            NotYetGenerated(pageID);  // builder->BuildKernelModuleParams()
+            page(&TReportParametersBuilder::BuildInstalledRPMParams);
+            page(&TReportParametersBuilder::BuildKernelModuleParams);
         }
     }
     Trace(name + kExiting);
 }
 
-// builder->HasTeamInfo() chooses BuildNetworkWithTeamingParams or
-// BuildNetworkWithoutTeamingParams.
-void TWriter::Generator_NetworkSettings(TBuilderPtr /*builder*/, std::string pageID) {
+// The network page has one link and two definitions: with the team tables
+// when some port belongs to a team, without them otherwise.
+void TWriter::Generator_NetworkSettings(TBuilderPtr builder, std::string pageID) {
     WriteOrCompare(
         "TWriter::Generator_NetworkSettings", fProviderType == kDeltaProviderType,
-        [&] { NotYetGenerated(pageID); },   // WriteGenericReport(params)
-        [&] { NotYetGenerated(pageID); });  // WriteGenericDeltaReport(params)
+        [&] {
+            WriteGenericReport(builder->HasTeamInfo() ? builder->BuildNetworkWithTeamingParams()
+                                                      : builder->BuildNetworkWithoutTeamingParams());
+        },
+        [&] { NotYetGenerated(pageID); });  // WriteGenericDeltaReport(params), chosen alike
 }
 
-void TWriter::Generator_ResourceUtilization(TBuilderPtr /*builder*/, std::string pageID) {
+void TWriter::Generator_ResourceUtilization(TBuilderPtr builder, std::string pageID) {
     const std::string name = "TWriter::Generator_ResourceUtilization";
     if (fPreboot) {
         Trace(name + kEntering);
@@ -87,11 +104,11 @@ void TWriter::Generator_ResourceUtilization(TBuilderPtr /*builder*/, std::string
     }
     WriteOrCompare(
         name, fProviderType == kDeltaProviderType,
-        [&] { NotYetGenerated(pageID); },   // WriteGenericReport(builder->BuildResourceUtilizationParams())
+        [&] { WriteGenericReport(builder->BuildResourceUtilizationParams()); },
         [&] { NotYetGenerated(pageID); });  // WriteGenericDeltaReport(builder->BuildResourceUtilizationParams())
 }
 
-void TWriter::Generator_Processes(TBuilderPtr /*builder*/, std::string pageID) {
+void TWriter::Generator_Processes(TBuilderPtr builder, std::string pageID) {
     const std::string name = "TWriter::Generator_Processes";
     if (fPreboot) {
         Trace(name + kEntering);
@@ -101,13 +118,14 @@ void TWriter::Generator_Processes(TBuilderPtr /*builder*/, std::string pageID) {
     }
     WriteOrCompare(
         name, fProviderType == kDeltaProviderType,
-        [&] { NotYetGenerated(pageID); },   // WriteGenericReport(builder->BuildProcessesParams())
+        [&] { WriteGenericReport(builder->BuildProcessesParams()); },
         [&] { NotYetGenerated(pageID); });  // WriteGenericDeltaReport(builder->BuildProcessesParams())
 }
 
 // The configuration of the operating system (not for pre-boot data), and on
-// Linux its configuration files. In delta mode both are compared.
-void TWriter::Generator_OSConfiguration(TBuilderPtr /*builder*/, std::string pageID) {
+// Linux, pre-boot data included, its configuration files. A VMware host has
+// no such files page. In delta mode both are compared.
+void TWriter::Generator_OSConfiguration(TBuilderPtr builder, std::string pageID) {
     const std::string name = "TWriter::Generator_OSConfiguration";
     const bool delta = fProviderType == kDeltaProviderType;
     Trace(name + kEntering);
@@ -116,16 +134,16 @@ void TWriter::Generator_OSConfiguration(TBuilderPtr /*builder*/, std::string pag
             Trace(name + kDeltaDoComparison);
             NotYetGenerated(pageID);  // WriteGenericDeltaReport(builder->BuildOSConfigParams())
         } else {
-            NotYetGenerated(pageID);  // WriteGenericReport(builder->BuildOSConfigParams())
+            WriteGenericReport(builder->BuildOSConfigParams());
         }
     }
-    if (IsLinux(fOSType)) {
+    if (fOSType == TReportParametersBuilder::kOSLinux) {
         Trace(name + " -- Under Linux, write Linux Config Files");
         if (delta) {
             Trace(name + kDeltaDoComparison);
             NotYetGenerated(pageID);  // WriteGenericDeltaReport(builder->BuildSysConfigParams())
         } else {
-            NotYetGenerated(pageID);  // WriteGenericReport(builder->BuildSysConfigParams())
+            WriteGenericReport(builder->BuildSysConfigParams());
         }
     }
     Trace(name + kExiting);

@@ -92,6 +92,26 @@ public:
     // The same page with a link to its raw-data page in the title.
     void WriteGenericReportWithLink(TReportParameters params, const std::string& link);
 
+    // --- Raw-data pages ---
+    // A raw-data page lists the commands a collector issued to an external
+    // tool; each row links to a text file beside the report that holds the
+    // tool's output. Each writer takes the link name of its standard page,
+    // to which the raw page links back, and returns the raw page's link name,
+    // or "" when it wrote no page. The others are back-end slots below.
+
+    // The PCI bus listings. A result file that cannot be written leaves its
+    // row blank; "" also when no row could be filled.
+    std::string WritePCIRawDataReport(std::string linkName);
+    // The Fusion-io tool's commands, each result named by its command when
+    // that is a plain file name, by a numbered name otherwise.
+    std::string WriteFIORawDataReport(std::string linkName);
+    // Whether any LSI tool left raw data (utility, IR or MegaRAID tool).
+    bool isLSIRawDataPresent();
+    // Whether the MegaRAID command-line tool left raw data.
+    bool isMRRawDataPresent();
+    // Whether the MegaRAID vendor provider reported an adapter.
+    bool isMRVendorProviderPresent();
+
     // --- Page generators ---
     // WriteReportPage calls one of these per page id. Each decides by the
     // mode flags whether and how its page is written.

@@ -2,11 +2,16 @@
 // follows a navigation link into the page frame, finds a table by its title
 // and a value in it, sorts it by a column both ways, and saves a screenshot.
 //
-//   node report.test.js --report DIR --page NAME --table TITLE --value TEXT
-//                       --sort COLUMN [--order A,B,C] [--screenshot FILE]
+//   node report.test.js --report DIR [--page NAME --table TITLE --value TEXT
+//                       --sort COLUMN [--order A,B,C]] [--expect PAGE|TABLE|TEXT]...
+//                       [--screenshot FILE]
 //
-// --order, when given, is the column's expected ascending order. Exit 0 on
-// success, 1 on a failure, 77 when no Chromium is installed.
+// --order, when given, is the column's expected ascending order. Each
+// --expect (it may be given many times) opens the page PAGE from the
+// navigation, which must not be marked as without data, and finds TEXT in
+// a cell of the table titled TABLE, or of any table of the page when TABLE
+// is empty. Exit 0 on success, 1 on a failure, 77 when no Chromium is
+// installed.
 'use strict';
 
 const fs = require('fs');
@@ -16,15 +21,67 @@ const { naturalCompare } = require('../../backends/assets/tkr_sort.js');
 const SKIP = 77;
 
 function parseArguments(argv) {
-  const options = {};
+  const options = { expect: [] };
   for (let i = 0; i < argv.length; i += 2) {
     if (!argv[i].startsWith('--') || i + 1 >= argv.length) throw new Error(`bad argument: ${argv[i]}`);
-    options[argv[i].slice(2)] = argv[i + 1];
+    const name = argv[i].slice(2);
+    if (name === 'expect') {
+      const parts = argv[i + 1].split('|');
+      if (parts.length !== 3 || !parts[0] || !parts[2]) throw new Error(`bad --expect: ${argv[i + 1]}`);
+      options.expect.push({ page: parts[0], table: parts[1], value: parts[2] });
+    } else {
+      options[name] = argv[i + 1];
+    }
   }
-  for (const required of ['report', 'page', 'table', 'value', 'sort']) {
-    if (!options[required]) throw new Error(`missing --${required}`);
+  if (!options.report) throw new Error('missing --report');
+  const sorting = ['page', 'table', 'value', 'sort'];
+  if (sorting.some((name) => options[name])) {
+    for (const required of sorting) {
+      if (!options[required]) throw new Error(`missing --${required}`);
+    }
+  } else if (options.expect.length === 0) {
+    throw new Error('nothing to check: give --page ... --sort, or --expect');
   }
   return options;
+}
+
+function escapeRegExp(text) {
+  return text.replace(/[.*+?^${}()|[\]\\]/g, '\\$&');
+}
+
+// Clicks the navigation link of a page and waits until the page frame shows
+// it. Returns the frame and whether the link marks the page as without data.
+async function openPage(page, name) {
+  const nav = page.frameLocator('iframe[name="nav_frame"]');
+  const text = new RegExp(`^\\s*${escapeRegExp(name)}(\\s*\\(no data\\))?\\s*$`);
+  const link = nav.locator('#navbar a', { hasText: text }).first();
+  await link.waitFor({ timeout: 10000 });
+  const target = await link.getAttribute('href');
+  const noData = ((await link.getAttribute('class')) || '').split(/\s+/).includes('nodata');
+  await link.click();
+  const data = page.frame({ name: 'data_frame' });
+  check(data, 'no frame named data_frame');
+  await data.waitForURL((url) => url.pathname.endsWith('/' + target), { timeout: 10000 });
+  return { data, noData };
+}
+
+// The table right under the title `title` (of a table written in several
+// grids, the first), or when the title is empty the first table of the
+// page that shows `value`; `value` must show in one of its cells.
+async function tableShowing(data, title, value) {
+  let table;
+  if (title) {
+    const heading = data.locator('div.tabletitle, div.tablesubtitle', { hasText: title }).first();
+    await heading.waitFor({ timeout: 10000 });
+    check(await heading.isVisible(), `table title "${title}" is not visible`);
+    table = heading.locator('xpath=following-sibling::table[1]');
+  } else {
+    table = data.locator('table', { has: data.locator('td', { hasText: value }) }).first();
+    await table.waitFor({ timeout: 10000 });
+  }
+  const cell = table.locator('td', { hasText: value }).first();
+  check(await cell.isVisible(), `value "${value}" is not shown in table "${title}"`);
+  return table;
 }
 
 function findChromium() {
@@ -65,23 +122,28 @@ async function main() {
     page.on('pageerror', (error) => errors.push(error.message));
     await page.goto('file://' + index);
 
+    // Each page expected filled: opened from the navigation, a table of it
+    // showing a known value.
+    for (const expected of options.expect) {
+      const { data, noData } = await openPage(page, expected.page);
+      check(!noData, `the navigation marks "${expected.page}" as without data`);
+      await tableShowing(data, expected.table, expected.value);
+    }
+    check(errors.length === 0, `script errors: ${errors.join('; ')}`);
+    if (!options.sort) {
+      if (options.screenshot) {
+        fs.mkdirSync(path.dirname(path.resolve(options.screenshot)), { recursive: true });
+        await page.screenshot({ path: options.screenshot });
+      }
+      console.log(`ok: ${options.expect.length} pages open from the navigation and show their tables`);
+      return 0;
+    }
+
     // Navigation: the link in the left frame opens the page in the right one.
-    const nav = page.frameLocator('iframe[name="nav_frame"]');
-    const link = nav.locator('#navbar a', { hasText: options.page }).first();
-    await link.waitFor({ timeout: 10000 });
-    const target = await link.getAttribute('href');
-    await link.click();
-    const data = page.frame({ name: 'data_frame' });
-    check(data, 'no frame named data_frame');
-    await data.waitForURL((url) => url.pathname.endsWith('/' + target), { timeout: 10000 });
+    const { data } = await openPage(page, options.page);
 
     // The table under its title, holding the known value.
-    const title = data.locator('div.tabletitle, div.tablesubtitle', { hasText: options.table }).first();
-    await title.waitFor({ timeout: 10000 });
-    check(await title.isVisible(), `table title "${options.table}" is not visible`);
-    const table = title.locator('xpath=following-sibling::table[1]');
-    const cell = table.locator('td', { hasText: options.value }).first();
-    check(await cell.isVisible(), `value "${options.value}" is not shown in table "${options.table}"`);
+    const table = await tableShowing(data, options.table, options.value);
 
     // Sorting by a header click, ascending then descending.
     check(await table.evaluate((element) => element.classList.contains('sortable')), 'the table is not sortable');
@@ -109,7 +171,8 @@ async function main() {
       fs.mkdirSync(path.dirname(path.resolve(options.screenshot)), { recursive: true });
       await page.screenshot({ path: options.screenshot });
     }
-    console.log(`ok: "${options.page}" opens in the frame, table "${options.table}" shows "${options.value}", ` +
+    console.log(`ok: ${options.expect.length} pages show their tables; "${options.page}" opens in the frame, ` +
+                `table "${options.table}" shows "${options.value}", ` +
                 `sorting by "${options.sort}" works both ways (${up.length} rows)`);
     return 0;
   } finally {

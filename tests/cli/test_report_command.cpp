@@ -147,6 +147,34 @@ TEST_F(ReportCommand, RefusesWithOneLineAndTheRightStatus) {
     EXPECT_EQ(earlierIndex, Slurp(Path("earlier/index.html")));
 }
 
+// One page on standard output, as an inventory page: its title, its tables
+// with the collection's values, and nothing written anywhere else.
+TEST_F(ReportCommand, PagePrintsOnePageOfTheCollection) {
+    struct Case {
+        const char* pageID;
+        std::vector<std::string> showing;  // texts the page must hold
+    } cases[] = {
+        {"SystemConfig",
+         {"<title>System Overview</title>", "<div class=\"tabletitle\">Operating System</div>",
+          "<td>Norvane Stratus NS2480 M4</td>", "<td>Red Hat Enterprise Linux Server release 7.9 (Maipo)</td>"}},
+        {"HardwareInfo",
+         {"<title>Hardware Inventory</title>", "<div class=\"tabletitle\">Processor/Core</div>",
+          "<td>Intel(R) Xeon(R) Gold 6248R CPU @ 3.00GHz</td>"}},
+    };
+    for (const Case& c : cases) {
+        SCOPED_TRACE(c.pageID);
+        TCommandResult r = RunBraigrion(Args({"page", c.pageID}, SampleFiles()));
+        ASSERT_EQ(0, r.fStatus) << r.fErr;
+        EXPECT_EQ("", r.fErr);
+        EXPECT_EQ(0u, r.fOut.find("<html>")) << r.fOut.substr(0, 200);
+        EXPECT_NE(std::string::npos, r.fOut.find("global_GUI.css")) << "the inventory style";
+        for (const std::string& text : c.showing) EXPECT_NE(std::string::npos, r.fOut.find(text)) << text;
+        // One page only: a single title.
+        EXPECT_EQ(std::string::npos, r.fOut.find("<title>", r.fOut.find("<title>") + 1));
+    }
+    EXPECT_TRUE(Entries().empty()) << "the page command writes no files";
+}
+
 TEST_F(ReportCommand, EveryCommandHasHelp) {
     for (const char* command : {"report", "page", "info"}) {
         TCommandResult r = RunBraigrion({command, "--help"});

@@ -1,5 +1,6 @@
 // Runs a report against the recording writer and gives its transcript, with
-// a "page <id>" line wherever the driver asked for a page.
+// a "page <id>" line wherever the driver asked for a page that has no
+// generator yet, and one line, its index entry, for each page written.
 #pragma once
 
 #include <map>
@@ -21,6 +22,19 @@ public:
                 writer.Note("page " + line.substr(kUnknownPage.size()));
             }
         });
+    }
+
+    // The writer's transcript with each written page folded into its
+    // WriteIndexEntry line: the calls from OpenPage to ClosePage are left out.
+    std::string Transcript() const {
+        std::string text;
+        bool inPage = false;
+        for (const std::string& call : writer.Calls()) {
+            if (call.compare(0, 9, "OpenPage(") == 0) inPage = true;
+            if (!inPage) text += call + "\n";
+            if (call == "ClosePage()") inPage = false;
+        }
+        return text;
     }
 
     TLogCapture log;

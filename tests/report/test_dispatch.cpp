@@ -23,6 +23,7 @@ typedef std::vector<std::string> TLines;
 const char kWindows[] = "ORVSG_OperatingSystem ProductVendor=\"Microsoft Corporation\" OSType=uint16:73";
 const char kLinux[] = "ORVSG_OperatingSystem ProductVendor=\"Red Hat\" OSType=uint16:36";
 const char kPreboot[] = "ORVSG_CollectionInfo Build=\"4.0.1-preboot\"";
+const char kVMware[] = "ORVSG_OperatingSystem ProductVendor=\"VMware, Inc.\" OSType=uint16:78";
 const char kNoSystem[] = "";
 
 std::string Page(const std::string& id) {
@@ -58,8 +59,14 @@ struct TDispatchCase {
     const char* repository;
     bool delta;
     bool kmc;
-    TLines lines;  // what the page logs between its entry lines and its exit
+    TLines lines;  // what the dispatch and the generator log between the page's entry lines and its exit
+    TLines written = {};  // the index entries of the pages written
 };
+
+// The index entry of a declared page that was written.
+std::string Entry(const std::string& link, const std::string& name) {
+    return "WriteIndexEntry(\"" + link + "\", \"" + name + "\", true)";
+}
 
 void PrintTo(const TDispatchCase& c, std::ostream* os) {
     *os << c.name;
@@ -79,8 +86,18 @@ TEST_P(DispatchTest, GeneratorDecidesByTheModeFlags) {
                        "TWriter::WriteReportPage -- WriterType = [" + c.writerType + "] PageID = [" + c.pageID + "]"};
     expected = Join(expected, c.lines);
     expected.push_back("TWriter::WriteReportPage -- Exiting ");
-    EXPECT_EQ(expected, run.log.Messages());
-    EXPECT_TRUE(run.writer.Calls().empty());
+    // What the builder and the page writer log is theirs to test.
+    TLines dispatched;
+    for (const std::string& line : run.log.Messages()) {
+        if (line.compare(0, 24, "TWriter::WriteReportPage") == 0 || line.compare(0, 19, "TWriter::Generator_") == 0) {
+            dispatched.push_back(line);
+        }
+    }
+    EXPECT_EQ(expected, dispatched);
+    EXPECT_EQ(c.written, run.writer.CallsStartingWith("WriteIndexEntry("));
+    if (c.written.empty()) {
+        EXPECT_TRUE(run.writer.Calls().empty());
+    }
 }
 
 const char kDoNothing[] = "Under DELTA mode [Do Nothing]";
@@ -90,7 +107,7 @@ INSTANTIATE_TEST_SUITE_P(
     Pages, DispatchTest,
     ::testing::Values(
         TDispatchCase{"Overview", "SystemConfig", "html", "default", kWindows, false, false,
-                      Writes("SystemOverview", "SystemConfig")},
+                      Writes("SystemOverview", "SystemConfig", 0), {Entry("system_overview", "System Overview")}},
         TDispatchCase{"OverviewDelta", "SystemConfig", "html", "default", kWindows, true, false,
                       {Gen("SystemOverview", "Entering"), Gen("SystemOverview", kCompare), Page("SystemConfig"),
                        Gen("SystemOverview", "Exiting")}},
@@ -99,18 +116,56 @@ INSTANTIATE_TEST_SUITE_P(
         TDispatchCase{"HighlightsInventory", "CriticalDetails", "inventory", "default", kWindows, false, false,
                       Writes("CriticalDetails", "CriticalDetails")},
         TDispatchCase{"InstallationsLinux", "OSInstallations", "html", "default", kLinux, false, false,
-                      Writes("OSInstallation", "OSInstallations", 3)},
+                      Writes("OSInstallation", "OSInstallations", 0),
+                      {Entry("installedapps", "Installed Applications"), Entry("installed_packages", "Installed Packages"),
+                       Entry("kernelmodules", "Kernel Modules")}},
+        TDispatchCase{"InstallationsWindows", "OSInstallations", "html", "default", kWindows, false, false,
+                      Writes("OSInstallation", "OSInstallations", 0),
+                      {Entry("installedapps", "Installed Applications"), Entry("win_components", "Windows Components"),
+                       Entry("installedfixes", "Installed Hotfixes"), Entry("devicedriver", "Device Drivers"),
+                       Entry("systemservice", "System Services")}},
+        TDispatchCase{"InstallationsDelta", "OSInstallations", "html", "default", kLinux, true, false,
+                      {Gen("OSInstallation", "Entering"), Gen("OSInstallation", kCompare), Page("OSInstallations"),
+                       Page("OSInstallations"), Page("OSInstallations"), Gen("OSInstallation", "Exiting")}},
         TDispatchCase{"InstallationsPreboot", "OSInstallations", "html", "default", kPreboot, false, false,
                       Says("OSInstallation", "Under pTKR, no OS installation information needed")},
         TDispatchCase{"ConfigurationPreboot", "OSConfiguration", "html", "default", kPreboot, false, false,
                       {Gen("OSConfiguration", "Entering"), Gen("OSConfiguration", "Under Linux, write Linux Config Files"),
-                       Page("OSConfiguration"), Gen("OSConfiguration", "Exiting")}},
+                       Gen("OSConfiguration", "Exiting")},
+                      {Entry("linux_config", "Linux Config Files")}},
+        TDispatchCase{"ConfigurationLinux", "OSConfiguration", "html", "default", kLinux, false, false,
+                      {Gen("OSConfiguration", "Entering"), Gen("OSConfiguration", "Under Linux, write Linux Config Files"),
+                       Gen("OSConfiguration", "Exiting")},
+                      {Entry("os_config", "OS Configuration"), Entry("linux_config", "Linux Config Files")}},
+        // A VMware host has no configuration files page.
+        TDispatchCase{"ConfigurationVMware", "OSConfiguration", "html", "default", kVMware, false, false,
+                      Writes("OSConfiguration", "OSConfiguration", 0), {Entry("os_config", "OS Configuration")}},
         TDispatchCase{"ConfigurationLinuxDelta", "OSConfiguration", "html", "default", kLinux, true, false,
                       {Gen("OSConfiguration", "Entering"), Gen("OSConfiguration", kCompare), Page("OSConfiguration"),
                        Gen("OSConfiguration", "Under Linux, write Linux Config Files"),
                        Gen("OSConfiguration", kCompare), Page("OSConfiguration"), Gen("OSConfiguration", "Exiting")}},
+        // Without raw data the page has no link to a raw-data page.
         TDispatchCase{"PciWithRawData", "PCIInfo", "html", "luz", kWindows, false, false,
-                      Writes("PCIInformation", "PCIInfo", 2)},
+                      Writes("PCIInformation", "PCIInfo", 0), {Entry("pci_info", "PCI Information")}},
+        TDispatchCase{"Pci", "PCIInfo", "text", "luz", kWindows, false, false, Writes("PCIInformation", "PCIInfo", 0),
+                      {Entry("pci_info", "PCI Information")}},
+        TDispatchCase{"PciDelta", "PCIInfo", "html", "default", kWindows, true, false,
+                      {Gen("PCIInformation", "Entering"), Gen("PCIInformation", kCompare), Page("PCIInfo"),
+                       Gen("PCIInformation", "Exiting")}},
+        TDispatchCase{"HardwareInventory", "HardwareInfo", "html", "default", kWindows, false, false,
+                      Writes("HardwareInventory", "HardwareInfo", 0), {Entry("hw_info", "Hardware Inventory")}},
+        TDispatchCase{"Network", "NetworkWithTeaming", "html", "default", kWindows, false, false,
+                      Writes("NetworkSettings", "NetworkWithTeaming", 0), {Entry("net", "Network Settings")}},
+        TDispatchCase{"ResourcesPreboot", "ResourceUtilization", "html", "default", kPreboot, false, false,
+                      Says("ResourceUtilization", "Under pTKR, no Resource Utilization information needed")},
+        TDispatchCase{"Processes", "Processes", "html", "default", kLinux, false, false,
+                      Writes("Processes", "Processes", 0), {Entry("processes", "Processes")}},
+        TDispatchCase{"VMwareESXi", "Vmware3i", "html", "default", kWindows, false, false,
+                      Writes("VMwareESXi", "Vmware3i", 0), {Entry("vmware_esxi", "VMware ESXi")}},
+        TDispatchCase{"VMwareESXiDelta", "Vmware3i", "html", "default", kWindows, true, false,
+                      Says("VMwareESXi", kDoNothing)},
+        TDispatchCase{"PatchBeacon", "PatchBeacon", "html", "default", kWindows, false, false,
+                      Writes("PatchBeacon", "PatchBeacon", 0), {Entry("pb", "PatchBeacon")}},
         TDispatchCase{"KMCConfiguration", "KMCConfig", "html", "default", kWindows, false, true,
                       Writes("ServProcConfiguration", "KMCConfig")},
         TDispatchCase{"ServProcConfigurationDelta", "ServProcConfig", "html", "default", kWindows, true, false,
@@ -209,7 +264,8 @@ TEST(Dispatch, AFailingPageIsContainedAndTheNextPageRuns) {
     report.Write(&writer, {});
 
     const std::string transcript = writer.Transcript();
-    EXPECT_NE(std::string::npos, transcript.find("page PCIInfo\npage ServProcConfig\n"));
+    EXPECT_NE(std::string::npos,
+              transcript.find("WriteIndexEntry(\"pci_info\", \"PCI Information\", true)\npage ServProcConfig\n"));
     EXPECT_EQ(std::string::npos, transcript.find("page Firmware\n"));
     EXPECT_NE(std::string::npos, transcript.find("page TKRLog\nEndReport()\n"));
 

@@ -22,27 +22,29 @@ using testing::TReportRun;
 
 const char kWindows[] = "ORVSG_OperatingSystem ProductVendor=\"Microsoft Corporation\" OSType=uint16:73\n";
 
-// A whole run over a Windows collection in the default mode. A "page" line
-// stands for each page a generator writes: the installation page of Windows
-// has five parts, the service processor logs three; the license key page is
-// left out without KMC, the BIOS settings page without its switch.
+// A whole run over a Windows collection in the default mode. A page written
+// stands as its index entry; a "page" line stands for each page a generator
+// will write once its section is part of the library. The installation page
+// of Windows has five parts, the service processor logs three; the license
+// key page is left out without KMC, the BIOS settings page without its
+// switch.
 const char kDefaultRun[] = R"(Initialize("out", mode="default")
 StartReport()
 WriteCategory("Software")
-page SystemConfig
-page OSInstallations
-page OSInstallations
-page OSInstallations
-page OSInstallations
-page OSInstallations
-page NetworkWithTeaming
-page ResourceUtilization
-page Processes
-page OSConfiguration
+WriteIndexEntry("system_overview", "System Overview", true)
+WriteIndexEntry("installedapps", "Installed Applications", true)
+WriteIndexEntry("win_components", "Windows Components", true)
+WriteIndexEntry("installedfixes", "Installed Hotfixes", true)
+WriteIndexEntry("devicedriver", "Device Drivers", true)
+WriteIndexEntry("systemservice", "System Services", true)
+WriteIndexEntry("net", "Network Settings", true)
+WriteIndexEntry("resource", "Resource Utilization", true)
+WriteIndexEntry("processes", "Processes", true)
+WriteIndexEntry("os_config", "OS Configuration", true)
 EndCategory()
 WriteCategory("Hardware")
-page HardwareInfo
-page PCIInfo
+WriteIndexEntry("hw_info", "Hardware Inventory", true)
+WriteIndexEntry("pci_info", "PCI Information", true)
 page Firmware
 page ServProcConfig
 page Environmentals
@@ -59,7 +61,7 @@ page Qlogic
 page Emulex
 page Broadcom
 page Brocade
-page Vmware3i
+WriteIndexEntry("vmware_esxi", "VMware ESXi", true)
 page GlowTrace
 page BIST
 EndCategory()
@@ -75,7 +77,7 @@ WriteCategory("Analysis")
 page MergedLog
 page MergedDevice
 page MelodyDeviceAnalysis
-page PatchBeacon
+WriteIndexEntry("pb", "PatchBeacon", true)
 page FileLoaderResult
 page DiagsFull
 EndCategory()
@@ -113,8 +115,18 @@ EndCategory()
 EndReport()
 )";
 
-const char kWindowsInstallation[] =
-    "page OSInstallations\npage OSInstallations\npage OSInstallations\npage OSInstallations\npage OSInstallations\n";
+#define INDEX_ENTRY(link, name) "WriteIndexEntry(\"" link "\", \"" name "\", true)\n"
+
+const char kInstalledApps[] = INDEX_ENTRY("installedapps", "Installed Applications");
+const char kWindowsInstallation[] = INDEX_ENTRY("installedapps", "Installed Applications")
+    INDEX_ENTRY("win_components", "Windows Components") INDEX_ENTRY("installedfixes", "Installed Hotfixes")
+        INDEX_ENTRY("devicedriver", "Device Drivers") INDEX_ENTRY("systemservice", "System Services");
+const char kLinuxInstallation[] = INDEX_ENTRY("installedapps", "Installed Applications")
+    INDEX_ENTRY("installed_packages", "Installed Packages") INDEX_ENTRY("kernelmodules", "Kernel Modules");
+const char kOSConfiguration[] = INDEX_ENTRY("os_config", "OS Configuration");
+const char kLinuxConfiguration[] = INDEX_ENTRY("linux_config", "Linux Config Files");
+const char kResourcesAndProcesses[] =
+    INDEX_ENTRY("resource", "Resource Utilization") INDEX_ENTRY("processes", "Processes");
 
 // Replaces the one occurrence of `from`; fails the test when there is none.
 std::string Edit(std::string text, const std::string& from, const std::string& to) {
@@ -153,7 +165,7 @@ TEST_P(ReportRunTest, WritesTheCategoriesAndPagesOfItsMode) {
 
     std::string expected = kDefaultRun;
     for (const auto& edit : c.edits) expected = Edit(expected, edit.first, edit.second);
-    EXPECT_EQ(expected, run.writer.Transcript());
+    EXPECT_EQ(expected, run.Transcript());
     for (const std::string& line : c.logged) EXPECT_TRUE(run.log.Contains(line)) << line;
 }
 
@@ -166,8 +178,6 @@ INSTANTIATE_TEST_SUITE_P(
                  kWindows,
                  {{"mode", TCIMValue("luz")}},
                  {{"mode=\"default\"", "mode=\"luz\""},
-                  // The PCI page has a raw-data page beside it.
-                  {"page PCIInfo\n", "page PCIInfo\npage PCIInfo\n"},
                   {"page SPLogs\nEndCategory()\n",
                    "page SPLogs\nEndCategory()\nWriteCategory(\"ORV Service\")\npage QVAChipsetRegister\n"
                    "page CFTSetting\npage NVSMILog\npage AMDAticonfigLog\npage SPINTLog\nEndCategory()\n"}},
@@ -178,8 +188,8 @@ INSTANTIATE_TEST_SUITE_P(
                  "ORVSG_OperatingSystem ProductVendor=\"Red Hat\" OSType=uint16:36",
                  {},
                  {{"Windows Logs", "Linux Logs"},
-                  {kWindowsInstallation, "page OSInstallations\npage OSInstallations\npage OSInstallations\n"},
-                  {"page OSConfiguration\n", "page OSConfiguration\npage OSConfiguration\n"}},
+                  {kWindowsInstallation, kLinuxInstallation},
+                  {kOSConfiguration, std::string(kOSConfiguration) + kLinuxConfiguration}},
                  {"TWriter::Generator_OSConfiguration -- Under Linux, write Linux Config Files"}},
         // Pre-boot: no OS Logs category and no EndCategory for it, so the
         // service processor category's EndCategory closes "Hardware".
@@ -188,7 +198,9 @@ INSTANTIATE_TEST_SUITE_P(
                  {},
                  {{kOSLogs, ""},
                   {kWindowsInstallation, ""},
-                  {"page ResourceUtilization\npage Processes\n", ""}},
+                  {kResourcesAndProcesses, ""},
+                  // Pre-boot data have the configuration files of Linux only.
+                  {kOSConfiguration, kLinuxConfiguration}},
                  {"TReport::TReport -- TKR type is Preboot ",
                   "TReport::Write -- Under pTKR, no OS Logs information needed",
                   "TWriter::Generator_OSInstallation -- Under pTKR, no OS installation information needed",
@@ -198,7 +210,7 @@ INSTANTIATE_TEST_SUITE_P(
         TRunCase{"UnknownOSType",
                  "ORVSG_OperatingSystem ProductVendor=\"Sun\" OSType=uint16:29",
                  {},
-                 {{kOSLogs, "EndCategory()\n"}, {kWindowsInstallation, "page OSInstallations\n"}},
+                 {{kOSLogs, "EndCategory()\n"}, {kWindowsInstallation, kInstalledApps}},
                  {"TReport::Write -- Unknow OS type]"}},
         TRunCase{"KMC",
                  kWindows,
@@ -268,7 +280,7 @@ TEST(ReportRun, DeltaViewSkipsRepairsAndThePrebootTest) {
     report.Write(&run.writer, {});
 
     // Not pre-boot, so the OS Logs category stands as in an ordinary run.
-    EXPECT_EQ(kDeltaRun, run.writer.Transcript());
+    EXPECT_EQ(kDeltaRun, run.Transcript());
     EXPECT_TRUE(run.log.Contains("TWriter::Generator_Environmentals -- Under DELTA mode [Do nothing]"));
     EXPECT_TRUE(run.log.Contains("TWriter::Generator_OSLogs -- Under DELTA mode [Do Nothing]"));
     EXPECT_TRUE(FixupsRun(run.log).empty());
@@ -391,16 +403,20 @@ TEST(ReportPage, InventoryWriterGetsThePageWithItsRepairs) {
     struct TCase {
         std::string pageID;
         std::vector<std::string> repairs;
+        std::string page;  // the page's line in the transcript
     };
     const std::vector<TCase> cases = {
-        {"Analysis", {"TReport::AddManufacturerForMem -- Entering"}},
-        {"HardwareInfo", {"TReport::AddManufacturerForMem -- Entering", "TReport::fixRedundantMonitorInfo -- Entering"}},
-        {"CriticalDetails", {"TReport::fixCriticalDetailforRaidDiskRemoval -- Entering"}},
+        {"Analysis", {"TReport::AddManufacturerForMem -- Entering"}, "page Analysis\n"},
+        {"HardwareInfo",
+         {"TReport::AddManufacturerForMem -- Entering", "TReport::fixRedundantMonitorInfo -- Entering"},
+         INDEX_ENTRY("hw_info", "Hardware Inventory")},
+        {"CriticalDetails", {"TReport::fixCriticalDetailforRaidDiskRemoval -- Entering"}, "page CriticalDetails\n"},
         {"SystemConfig",
          {"TReport::fixCriticalDetailforRaidDiskRemoval -- Entering",
-          "TReport::fixProductNameofComputerSystem -- Entering"}},
-        {"Emulex", {"TReport::ConvertEmulexKoSTypeIDToHex -- Entering"}},
-        {"LSI", {}},
+          "TReport::fixProductNameofComputerSystem -- Entering"},
+         INDEX_ENTRY("system_overview", "System Overview")},
+        {"Emulex", {"TReport::ConvertEmulexKoSTypeIDToHex -- Entering"}, "page Emulex\n"},
+        {"LSI", {}, "page LSI\n"},
     };
     TRepoBuilder repo;
     repo.Parse(kWindows);
@@ -410,8 +426,7 @@ TEST(ReportPage, InventoryWriterGetsThePageWithItsRepairs) {
         TContextMap context = {{"pageID", TCIMValue(c.pageID)}};
         TReport report(repo.Namespace(), context, "inv");
         EXPECT_EQ("<page " + c.pageID + ">", report.GetPage(&run.writer, context));
-        EXPECT_EQ("Initialize(\"inv\", mode=\"default\")\npage " + c.pageID + "\nGetInventoryPage()\n",
-                  run.writer.Transcript());
+        EXPECT_EQ("Initialize(\"inv\", mode=\"default\")\n" + c.page + "GetInventoryPage()\n", run.Transcript());
         EXPECT_EQ(c.repairs, FixupsRun(run.log)) << c.pageID;
         EXPECT_TRUE(run.log.Contains("TReport::GetPage -- Start generating TKR inventory page, ID = [" + c.pageID + "]"));
         EXPECT_EQ(c.pageID == "Analysis",

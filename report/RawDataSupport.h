@@ -1,0 +1,113 @@
+// What the raw-data pages share: fetching a class's instances, the page
+// frame and the two-column table of commands, the cells of a row, the result
+// files beside the report and the names they are written under. Internal to
+// the report library.
+//
+// A raw-data page lists the commands a collector issued to an external tool;
+// each row links to a text file, written beside the page, that holds what
+// the tool printed.
+#pragma once
+
+#include <fstream>
+#include <string>
+#include <vector>
+
+#include "braigrion/TTable.h"
+#include "braigrion/TWriter.h"
+
+namespace braigrion {
+namespace rawdata {
+
+typedef std::vector<TWriter::TInstancePtr> TInstances;
+
+// Trace lines of the raw-data pages go to the core logger at this level.
+const int kTraceLevel = 3;
+void Trace(const std::string& line, int level = kTraceLevel);
+
+// The statuses of a result file that cannot be opened for writing: access
+// denied, and any other failure.
+const int kResultFileDenied = 27;
+const int kResultFileFailed = 11;
+
+// Table title of most raw-data tables.
+extern const char kCommandsIssued[];
+// Cell mark-up around a command and around the link to its result file.
+extern const char kCommandOpen[];
+extern const char kCommandClose[];
+extern const char kResultLinkOpen[];
+extern const char kResultLinkClose[];
+
+// The instances of `className` and its subclasses, in repository order.
+// Throws what the repository throws (a missing class among them).
+TInstances InstancesOf(const TWriter::TNamespacePtr& ns, const std::string& className);
+
+// Opens a raw-data page: the page file `link` under `outputPath`, its head,
+// and the title with the switch back to the standard page `standardLink`.
+void OpenRawPage(TWriter& writer, const std::string& outputPath, const std::string& link, const std::string& title,
+                 const std::string& standardLink);
+
+// The grid of one table of commands: a heading row and one row per
+// instance, two columns of 80% and 20%, the table 75% wide.
+TTable CommandsTable(size_t instances, const std::string& commandHeading, const std::string& resultHeading);
+
+// "prefix" + index + ".txt".
+std::string NumberedFileName(const std::string& prefix, int index);
+
+// Whether `name` can be written as a file of its own in the report's
+// directory and linked from a page as it stands: printable ASCII letters,
+// digits, blanks and ". _ - + = , @", neither beginning with a dot nor
+// beginning or ending with a blank, at most 128 bytes, and not of a kind the
+// report writes itself (".html", ".htm", ".css", ".js"). Everything else
+// (an absolute path, "..", a separator, a control character, a character
+// that a link would read as mark-up, a scheme, a query or a fragment) is not.
+bool IsPlainFileName(const std::string& name);
+
+// The file name under which a result named by collected text is written:
+// the text itself when IsPlainFileName holds, else `fallback`.
+std::string ResultFileName(const std::string& name, const std::string& fallback);
+
+// A result file opened for writing, truncating an earlier one. The
+// constructor throws TTKRException with kResultFileDenied when access to
+// the path is denied and kResultFileFailed for any other failure.
+class TResultFile {
+public:
+    explicit TResultFile(const std::string& path);
+    // Writes the text and a line feed, and flushes.
+    void WriteLine(const std::string& text);
+    void Close() { fFile.close(); }
+
+private:
+    std::ofstream fFile;
+};
+
+// The lines of a result value: each element of an array, or the one text of
+// a scalar. A null value gives no line.
+std::vector<std::string> ResultLines(const NORVTKR20::TCIMValue& value);
+
+// The value of an instance's property; throws what the repository throws.
+const NORVTKR20::TCIMValue& ValueOf(const TWriter::TInstancePtr& instance, const std::string& property);
+
+// How one table of a raw-data page reads its instances.
+struct TCommandTable {
+    std::string commandHeading;
+    std::string resultHeading;
+    std::string filePrefix;       // results are named prefix + index + ".txt"
+    std::string commandProperty;  // read as text; a failure escapes
+    std::string resultProperty;   // written line by line; a failure escapes
+};
+
+// Fills the table of these instances and writes their result files, in the
+// common order: for each instance the file name, the command in column 0,
+// the link in column 1, then the file. A file that cannot be opened ends the
+// table with the exception of TResultFile; so does a property that cannot
+// be read. The grid is not handed to the writer.
+TTable FillCommandsTable(TWriter& writer, const std::string& outputPath, const TInstances& instances,
+                         const TCommandTable& layout);
+
+// Cell texts of one row: the command made safe by the writer, and the
+// relative link to the result file.
+std::string CommandCell(TWriter& writer, const std::string& command, const std::string& opening = kCommandOpen);
+std::string ResultLinkCell(const std::string& fileName, const std::string& opening = kResultLinkOpen);
+
+}  // namespace rawdata
+}  // namespace braigrion
