@@ -130,8 +130,17 @@ TParser::~TParser() { XML_ParserFree(fParser); }
 // ---------------------------------------------------------------- feeding
 
 bool TParser::Feed(const char* data, size_t size, bool last) {
-    if (fFailure.fFailed) return false;
-    return Check(XML_Parse(fParser, data, static_cast<int>(size), last ? 1 : 0));
+    // Expat takes an int length: hand a large document over in slices.
+    const size_t kSlice = size_t(1) << 26;
+    do {
+        if (fFailure.fFailed) return false;
+        const size_t n = std::min(size, kSlice);
+        const bool final = last && n == size;
+        if (!Check(XML_Parse(fParser, data, static_cast<int>(n), final ? 1 : 0))) return false;
+        data += n;
+        size -= n;
+    } while (size > 0);
+    return true;
 }
 
 void* TParser::GetBuffer(size_t size) {
