@@ -32,50 +32,37 @@ void Render(backends::TBackendWriter& writer, TRendered& out) {
 
 const std::set<std::string> kPageStems = {"slots", "Environmentals", "lsi_rawData", "___.._escape", "tkrlog"};
 
-std::set<std::string> WithPrefix(const std::set<std::string>& stems, const std::string& extension) {
-    std::set<std::string> files;
-    for (const std::string& stem : stems) files.insert("outer/inner/report/" + stem + extension);
-    return files;
-}
 
-TEST(HtmlBackend, WritesTheReportDirectoryAsExpected) {
-    backends::THtmlWriter writer;
-    TRendered out;
-    Render(writer, out);
-    ASSERT_EQ("", out.failure);
-
-    std::set<std::string> expected = WithPrefix(kPageStems, ".html");
-    for (const char* file : {"index.html", "navbar.html", "global.css", "tkr_sort.js"})
-        expected.insert(std::string("outer/inner/report/") + file);
-    EXPECT_EQ(expected, FilesUnder(out.scratch.Path())) << "every file inside the report directory, no other";
-
-    std::vector<std::string> pages = {"index", "navbar"};
-    pages.insert(pages.end(), kPageStems.begin(), kPageStems.end());
-    for (const std::string& stem : pages) {
-        SCOPED_TRACE(stem);
-        std::string actual = ReadWholeFile(out.report + "/" + stem + ".html");
-        EXPECT_EQ(ExpectedText("html/" + stem + ".html", actual), actual);
-    }
-    EXPECT_EQ(std::string(backends::assets::kGlobalCss), ReadWholeFile(out.report + "/global.css"));
-    EXPECT_EQ(std::string(backends::assets::kSortScript), ReadWholeFile(out.report + "/tkr_sort.js"));
-}
-
-TEST(TextBackend, WritesTheReportDirectoryAsExpected) {
-    backends::TTextWriter writer;
-    TRendered out;
-    Render(writer, out);
-    ASSERT_EQ("", out.failure);
-
-    std::set<std::string> expected = WithPrefix(kPageStems, ".txt");
-    expected.insert("outer/inner/report/index.txt");
-    EXPECT_EQ(expected, FilesUnder(out.scratch.Path()));
-
-    std::vector<std::string> pages = {"index"};
-    pages.insert(pages.end(), kPageStems.begin(), kPageStems.end());
-    for (const std::string& stem : pages) {
-        SCOPED_TRACE(stem);
-        std::string actual = ReadWholeFile(out.report + "/" + stem + ".txt");
-        EXPECT_EQ(ExpectedText("text/" + stem + ".txt", actual), actual);
+// Every file inside the report directory, no other; each page as expected,
+// the HTML report's style sheet and sort script as built in.
+TEST(Backends, WriteTheReportDirectoryAsExpected) {
+    backends::THtmlWriter html;
+    backends::TTextWriter text;
+    const struct {
+        backends::TBackendWriter* writer;
+        std::string kind;  // the expected files' folder, and the pages' extension
+        std::vector<std::string> others;
+    } cases[] = {{&html, "html", {"index", "navbar"}}, {&text, "txt", {"index"}}};
+    for (const auto& c : cases) {
+        SCOPED_TRACE(c.kind);
+        TRendered out;
+        Render(*c.writer, out);
+        ASSERT_EQ("", out.failure);
+        std::vector<std::string> pages = c.others;
+        pages.insert(pages.end(), kPageStems.begin(), kPageStems.end());
+        std::set<std::string> expected;
+        for (const std::string& stem : pages) expected.insert("outer/inner/report/" + stem + "." + c.kind);
+        if (c.kind == "html") {
+            expected.insert("outer/inner/report/global.css");
+            expected.insert("outer/inner/report/tkr_sort.js");
+            EXPECT_EQ(std::string(backends::assets::kGlobalCss), ReadWholeFile(out.report + "/global.css"));
+            EXPECT_EQ(std::string(backends::assets::kSortScript), ReadWholeFile(out.report + "/tkr_sort.js"));
+        }
+        EXPECT_EQ(expected, FilesUnder(out.scratch.Path()));
+        for (const std::string& stem : pages) {
+            std::string actual = ReadWholeFile(out.report + "/" + stem + "." + c.kind);
+            EXPECT_EQ(ExpectedText((c.kind == "txt" ? "text/" : "html/") + stem + "." + c.kind, actual), actual) << stem;
+        }
     }
 }
 

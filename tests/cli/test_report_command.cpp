@@ -117,6 +117,11 @@ TEST_F(ReportCommand, RefusesWithOneLineAndTheRightStatus) {
         int status;
         std::string saying;  // a regular expression the one line must contain
     } cases[] = {
+        {{}, 2, "subcommand"},
+        {{"frobnicate"}, 2, "frobnicate"},
+        {{"info"}, 2, "collection"},
+        {{"info", malformed}, 2, "broken\\.xml:[0-9]+:[0-9]+: "},
+        {{"info", Path("missing.xml")}, 2, "missing\\.xml: no such file"},
         {Args({"report"}, SampleFiles()), 2, "--output is required"},
         {Args({"report", "-o", Path("x"), "--format", "pdf"}, SampleFiles()), 2, "pdf"},
         {Args({"report", "-o", Path("x"), "--mode", "fast"}, SampleFiles()), 2, "fast"},
@@ -173,16 +178,6 @@ TEST_F(ReportCommand, PagePrintsOnePageOfTheCollection) {
         EXPECT_EQ(std::string::npos, r.fOut.find("<title>", r.fOut.find("<title>") + 1));
     }
     EXPECT_TRUE(Entries().empty()) << "the page command writes no files";
-}
-
-TEST_F(ReportCommand, EveryCommandHasHelp) {
-    for (const char* command : {"report", "page", "info"}) {
-        TCommandResult r = RunBraigrion({command, "--help"});
-        EXPECT_EQ(0, r.fStatus) << command;
-        EXPECT_NE(std::string::npos, r.fOut.find("Usage")) << r.fOut;
-    }
-    TCommandResult page = RunBraigrion({"page", "--help"});
-    EXPECT_NE(std::string::npos, page.fOut.find("SystemConfig")) << "the page ids are listed";
 }
 
 }  // namespace

@@ -92,11 +92,7 @@ TEST(CIMValue, ContractConstructorsCarryTheirTypes) {
     EXPECT_EQ(T::eUint16, static_cast<T::ECIMType>(TCIMValue(static_cast<unsigned short>(4)).GetType()));
     EXPECT_EQ(T::eUint32, static_cast<T::ECIMType>(TCIMValue(4u).GetType()));
     EXPECT_EQ(T::eString, static_cast<T::ECIMType>(TCIMValue("x").GetType()));
-    TCIMValue dt(TCIMDateTime(2012, 1, 5, 0, 0, 0, 0, 0));
-    EXPECT_EQ(14, static_cast<int>(static_cast<T::ECIMType>(dt.GetType())));
-    EXPECT_EQ("2012-01-05 00:00:00", static_cast<TCIMDateTime>(dt).ToUIString());
-    std::string text = TCIMValue(std::string("abc"));
-    EXPECT_EQ("abc", text);
+    EXPECT_EQ(T::eDateTime, static_cast<T::ECIMType>(TCIMValue(TCIMDateTime()).GetType()));
 }
 
 TEST(CIMValue, ArraysConvertToTheirElementVector) {

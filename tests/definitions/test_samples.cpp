@@ -1,8 +1,8 @@
 // The sample collections against the page definitions they are meant to
-// fill: each loads, the probes see the platform it stands for, and every
-// table of the software, network and hardware pages that the platform has
-// finds instances with a value in every column. The few tables and columns
-// a platform has no data for are listed with the sample.
+// fill: the probes see the platform each stands for, and every table of the
+// software, network and hardware pages that the platform has finds instances
+// with a value in every column. The few tables and columns a platform has no
+// data for are listed with the sample.
 #include <algorithm>
 #include <filesystem>
 #include <set>
@@ -12,11 +12,11 @@
 #include <gtest/gtest.h>
 
 #include "braigrion/TReportParametersBuilder.h"
+#include "braigrion/TWriterUtil.h"
 #include "repository/CIMXMLReader.h"
 #include "repository/MemoryClass.h"
 #include "repository/MemoryInstance.h"
 #include "tkrcore/Callbacks.h"
-#include "tkrcore/TTKRException.h"
 
 namespace braigrion {
 namespace {
@@ -26,7 +26,6 @@ using NORVTKR20::ICIMNamespace;
 using NORVTKR20::TAddToVectorCallback;
 using NORVTKR20::TCIMContext;
 using NORVTKR20::TCIMValue;
-using NORVTKR20::TTKRException;
 
 typedef boost::shared_ptr<ICIMInstance> TInstancePtr;
 typedef std::vector<TInstancePtr> TInstances;
@@ -75,7 +74,7 @@ const std::set<std::string> kCarriedColumns = {"firmware:Post BIOS VPD/ReleaseDa
 
 const TSample kSamples[] = {
     {"windows-server", 1, false, "1.3", false, false, false,
-     With(kRareTables, {}),
+     kRareTables,
      {"net:Physical Network Ports/PrimaryWinsServer", "net:Physical Network Ports/SecondaryWinsServer",
       "net:Physical Network Ports/DhcpServer", "net:Virtual Network Ports/PrimaryWinsServer",
       "net:Virtual Network Ports/SecondaryWinsServer", "net:Virtual Network Ports/DhcpServer",
@@ -145,70 +144,25 @@ std::vector<TReportParameters> PagesOf(const TReportParametersBuilder& builder) 
     return pages;
 }
 
-bool IsNotFound(const TTKRException& ex) {
-    return ex.fStatusCode.fStatusCode == NORVTKR20::kNotFound;
+// The property holds something to show: not null, not an empty text, not an
+// empty array.
+bool HasValue(const boost::shared_ptr<NORVTKR20::ICIMProperty>& property) {
+    const TCIMValue& value = property->GetValue(TCIMContext());
+    if (value.IsNull()) return false;
+    if (value.IsArray()) return !static_cast<std::vector<TCIMValue>&>(value).empty();
+    return !value.ToString(10).empty();
 }
 
-// The instance's property holds something to show: not null, not an empty
-// text, not an empty array.
-bool HasValue(const TInstancePtr& instance, const std::string& property) {
-    TCIMContext context;
-    try {
-        const TCIMValue& value = instance->GetProperty(property, context)->GetValue(context);
-        if (value.IsNull()) return false;
-        if (value.IsArray()) return !static_cast<std::vector<TCIMValue>&>(value).empty();
-        return !value.ToString(10).empty();
-    } catch (const TTKRException& ex) {
-        if (!IsNotFound(ex)) throw;
-    }
-    return false;
-}
-
-TInstances Associated(const TInstancePtr& instance, const std::string& assocClass, const std::string& resultClass) {
-    TInstances far;
-    instance->EnumerateAssociatedInstances(TAddToVectorCallback<ICIMInstance>(far), assocClass, resultClass, "", "",
-                                           TCIMContext());
-    return far;
-}
-
+// Some property behind the column, as the table writer finds them, has a value.
 bool ColumnHasValue(const TInstancePtr& instance, const TReportProperty& column) {
-    if (!column.HasAssociationClass() && !column.HasAssociationTarget()) {
-        return HasValue(instance, column.GetProperty());
-    }
-    for (const TInstancePtr& far : Associated(instance, column.GetAssociationClass(), column.GetAssociationTarget())) {
-        if (HasValue(far, column.GetProperty())) return true;
-    }
+    auto properties = TWriterUtil::GetProperties(instance, column.GetProperty(), column.GetAssociationClass(),
+                                                 column.GetAssociationTarget());
     if (column.HasSecondaryAssociationTarget()) {
-        for (const TInstancePtr& far : Associated(instance, "", column.GetSecondaryAssociationTarget())) {
-            if (HasValue(far, column.GetProperty())) return true;
-        }
+        auto more = TWriterUtil::GetProperties(instance, column.GetProperty(), "",
+                                               column.GetSecondaryAssociationTarget());
+        properties.insert(properties.end(), more.begin(), more.end());
     }
-    return false;
-}
-
-// The instances of a table's class that pass its filters.
-TInstances InstancesOf(const boost::shared_ptr<ICIMNamespace>& ns, const TReportClass& cls) {
-    TInstances all;
-    try {
-        ns->GetClass(cls.GetClass(), TCIMContext())
-            ->EnumerateInstances(TAddToVectorCallback<ICIMInstance>(all), true, TCIMContext());
-    } catch (const TTKRException& ex) {
-        if (!IsNotFound(ex)) throw;
-    }
-    TInstances kept;
-    for (const TInstancePtr& instance : all) {
-        bool keep = true;
-        for (const TReportClass::TPropertyFilter& filter : cls.GetPropertyFilters()) {
-            bool match = HasValue(instance, filter.GetProperty()) &&
-                         instance->GetProperty(filter.GetProperty(), TCIMContext())
-                                 ->GetValue(TCIMContext())
-                                 .ToString(10)
-                                 .find(filter.GetValue()) != std::string::npos;
-            if (match == filter.IsExclude()) keep = false;
-        }
-        if (keep) kept.push_back(instance);
-    }
-    return kept;
+    return std::any_of(properties.begin(), properties.end(), HasValue);
 }
 
 void CheckTable(const TSample& sample, const std::string& table, const TReportClass& cls, const TInstances& instances,
@@ -248,14 +202,15 @@ TEST_P(SampleTest, FillsEveryTableItsPlatformHas) {
     for (const TReportParameters& page : PagesOf(builder)) {
         for (const TReportClass& cls : page.GetClasses()) {
             const std::string table = page.GetLinkName() + ":" + (cls.HasTitle() ? cls.GetTitle() : cls.GetClass());
-            TInstances instances = InstancesOf(ns, cls);
+            TInstances instances = TWriterUtil::GetInstances(ns, cls);
             CheckTable(sample, table, cls, instances, seen);
             if (!cls.HasAssociatedClass() || instances.empty()) continue;
             for (const TReportClass& nested : cls.GetAssociatedClasses()) {
                 TInstances reached;
                 for (const TInstancePtr& instance : instances) {
-                    TInstances far = Associated(instance, nested.GetAssocClass(), nested.GetResultClass());
-                    reached.insert(reached.end(), far.begin(), far.end());
+                    instance->EnumerateAssociatedInstances(TAddToVectorCallback<ICIMInstance>(reached),
+                                                           nested.GetAssocClass(), nested.GetResultClass(), "", "",
+                                                           TCIMContext());
                 }
                 CheckTable(sample, table + ">" + nested.GetClass(), nested, reached, seen);
             }

@@ -1,6 +1,7 @@
 // Helpers for the tests of the table engine and the generic pages: a
 // recording writer set up over a repository as a report run would set it up,
-// and its transcript without the calls that only make text safe.
+// its transcript without the calls that only make text safe, and a small
+// repository of adapters and their ports.
 #pragma once
 
 #include <cctype>
@@ -11,6 +12,7 @@
 #include <boost/make_shared.hpp>
 
 #include "braigrion/TWriter.h"
+#include "repository/RepoFixture.h"
 #include "support/LogCapture.h"
 #include "support/RecordingWriter.h"
 
@@ -62,6 +64,30 @@ public:
     TLogCapture log;
     TWriterType writer;
 };
+
+// Adapters a1 (ports eth1 10G, eth0 1G, eth9 1G), a2 (eth2 25G) and a3 (no
+// port), the ports reached through an association.
+inline boost::shared_ptr<repository::TMemoryNamespace> AdaptersWithPorts() {
+    using namespace testrepo;
+    using NORVTKR20::TCIMValue;
+    auto ns = repository::TMemoryNamespace::Create();
+    ns->DeclareClass(C("ORVSG_Adapter", "", {P("DeviceID", T::eString, {Q("Key", TCIMValue::Boolean(true))})}));
+    ns->DeclareClass(C("ORVSG_Port", "", {P("Name", T::eString, {Q("Key", TCIMValue::Boolean(true))}),
+                                          P("Speed", T::eString)}));
+    ns->DeclareClass(C("ORVSG_AdapterPort", "", {Ref("Antecedent", "ORVSG_Adapter"), Ref("Dependent", "ORVSG_Port")},
+                       {Q("Association", TCIMValue::Boolean(true))}));
+    const char* const links[][3] = {{"a1", "eth1", "10G"}, {"a1", "eth0", "1G"}, {"a1", "eth9", "1G"},
+                                    {"a2", "eth2", "25G"}};
+    for (const char* adapter : {"a1", "a2", "a3"}) ns->AddInstance("ORVSG_Adapter", {V("DeviceID", TCIMValue(adapter))});
+    for (const auto& link : links) {
+        ns->AddInstance("ORVSG_Port", {V("Name", TCIMValue(link[1])), V("Speed", TCIMValue(link[2]))});
+        ns->AddInstance("ORVSG_AdapterPort",
+                        {V("Antecedent", RefTo(ns, std::string("ORVSG_Adapter.DeviceID=\"") + link[0] + "\"")),
+                         V("Dependent", RefTo(ns, std::string("ORVSG_Port.Name=\"") + link[1] + "\""))});
+    }
+    ns->Link();
+    return ns;
+}
 
 }  // namespace testing
 }  // namespace braigrion

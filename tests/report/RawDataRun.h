@@ -24,7 +24,7 @@ namespace braigrion {
 namespace testing {
 
 // A recording writer whose EscapeText makes mark-up characters entities, so
-// that a test sees which texts were escaped.
+// that a transcript shows which texts were escaped.
 class TEscapingWriter : public TRecordingWriter {
 public:
     using TRecordingWriter::TRecordingWriter;
@@ -43,7 +43,6 @@ public:
     }
 };
 
-template <typename TWriterType = TRecordingWriter>
 class TRawDataRun {
 public:
     explicit TRawDataRun(boost::shared_ptr<NORVTKR20::ICIMNamespace> ns, const std::string& writerType = "html",
@@ -66,13 +65,13 @@ public:
 
     // The report's directory; its parent holds nothing else.
     std::string Dir() const { return (fRoot / "report").string(); }
-    std::string Root() const { return fRoot.string(); }
 
-    // The back-end calls without EscapeText, the directory shown as "out".
+    // The back-end calls without EscapeText and GetSeparatorText, the
+    // directory shown as "out".
     std::string Transcript() const {
         std::string text;
         for (const std::string& call : writer.Calls()) {
-            if (call.compare(0, 11, "EscapeText(") == 0) continue;
+            if (call.compare(0, 11, "EscapeText(") == 0 || call.compare(0, 17, "GetSeparatorText(") == 0) continue;
             std::string line = call;
             for (size_t at = line.find(Dir()); at != std::string::npos; at = line.find(Dir()))
                 line.replace(at, Dir().size(), "out");
@@ -81,14 +80,33 @@ public:
         return text;
     }
 
-    // Names of the entries of a directory, sorted.
-    static std::vector<std::string> Entries(const std::string& dir) {
+    // The link a writer answered, its transcript, then every entry of the
+    // report's directory with its size and text; anything written beside
+    // the directory is listed as well.
+    std::string Dump(const std::string& link) const {
+        std::string text = "link \"" + link + "\"\n" + Transcript();
+        for (const auto& entry : std::filesystem::directory_iterator(fRoot)) {
+            if (entry.path().filename() != "report") text += "== OUTSIDE THE REPORT: " + entry.path().filename().string() + "\n";
+        }
+        std::vector<std::string> names = Files();
+        for (const std::string& name : names) {
+            if (std::filesystem::is_directory(Dir() + "/" + name)) {
+                text += "== " + name + "/\n";
+                continue;
+            }
+            const std::string content = Read(name);
+            text += "== " + name + " (" + std::to_string(content.size()) + " bytes)\n" + content;
+        }
+        return text;
+    }
+
+    // Names of the entries of the report's directory, sorted.
+    std::vector<std::string> Files() const {
         std::vector<std::string> names;
-        for (const auto& entry : std::filesystem::directory_iterator(dir)) names.push_back(entry.path().filename().string());
+        for (const auto& entry : std::filesystem::directory_iterator(Dir())) names.push_back(entry.path().filename().string());
         std::sort(names.begin(), names.end());
         return names;
     }
-    std::vector<std::string> Files() const { return Entries(Dir()); }
 
     std::string Read(const std::string& name) const {
         std::ifstream in(Dir() + "/" + name, std::ios::binary);
@@ -101,7 +119,7 @@ public:
     void Block(const std::string& name) const { std::filesystem::create_directory(Dir() + "/" + name); }
 
     TLogCapture log;
-    TWriterType writer;
+    TEscapingWriter writer;
 
 private:
     std::filesystem::path fRoot;

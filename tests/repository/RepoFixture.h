@@ -46,12 +46,7 @@ inline TPropertyDeclData Ref(const std::string& name, const std::string& refClas
 
 inline TClassData C(const std::string& name, const std::string& super, std::vector<TPropertyDeclData> props,
                     std::vector<TQualifierData> qualifiers = {}) {
-    TClassData c;
-    c.fName = name;
-    c.fSuperClass = super;
-    c.fProperties = std::move(props);
-    c.fQualifiers = std::move(qualifiers);
-    return c;
+    return TClassData{name, super, std::move(qualifiers), std::move(props)};
 }
 
 inline TPropertyValue V(const std::string& name, const TCIMValue& value) {

@@ -6,7 +6,6 @@
 
 #include <algorithm>
 #include <cstdio>
-#include <map>
 #include <fstream>
 #include <string>
 #include <vector>
@@ -24,6 +23,7 @@ using NORVTKR20::TCIMDateTime;
 using NORVTKR20::TCIMReference;
 using NORVTKR20::TCIMValue;
 typedef NORVTKR20::TCIMValue::TCIMType T;
+typedef std::vector<std::pair<std::string, TCIMValue>> TKeys;
 
 const char kHead[] = "<?xml version=\"1.0\" encoding=\"utf-8\"?>\n<CIM CIMVERSION=\"2.0\" DTDVERSION=\"2.0\">";
 
@@ -99,39 +99,29 @@ const char kInstances[] = R"(<IRETURNVALUE>
 TEST(CIMXMLReader, ResponseValuesTakeTheirDeclaredTypes) {
     TLoadResult loaded = LoadCollectionFromString(Response(kInstances));
     const TMemoryInstance& disk = Instance(loaded, "X_Disk");
-    EXPECT_EQ(Value(disk, "DeviceID"), TCIMValue("d1"));
-    EXPECT_EQ(Value(disk, "Size"), TCIMValue::Unsigned(T::eUint64, 16));
-    EXPECT_EQ(Value(disk, "Offset"), TCIMValue::Signed(T::eSint8, -128));
-    EXPECT_EQ(Value(disk, "Ratio"), TCIMValue::Real(T::eReal32, 0.5));
-    EXPECT_EQ(Value(disk, "Online"), TCIMValue::Boolean(true));
-    EXPECT_EQ(Value(disk, "Letter"), TCIMValue::Char16("C"));
-
-    const TCIMDateTime installed = Value(disk, "Installed");
-    EXPECT_FALSE(installed.IsInterval());
-    EXPECT_EQ(installed.GetYear(), 2013);
-    EXPECT_EQ(installed.GetMicroseconds(), 458642u);
-    EXPECT_EQ(installed.GetUtcOffset(), 60);
-    const TCIMDateTime uptime = Value(disk, "Uptime");
-    EXPECT_TRUE(uptime.IsInterval());
-    EXPECT_EQ(uptime.GetDay(), 12u);
-    EXPECT_EQ(uptime.GetMicroseconds(), 6u);
-    const TCIMDateTime coarse = Value(disk, "Coarse");
-    EXPECT_NE(coarse.GetWildcards() & TCIMDateTime::kMinute, 0);
-    EXPECT_EQ(coarse.ToCIMString(), "2013042910****.******+000");
-
-    // A property without VALUE is present, null, and still typed.
-    const TCIMValue& missing = Value(disk, "Missing");
-    EXPECT_TRUE(missing.IsNull());
-    EXPECT_EQ(missing.GetType(), T::eUint16);
-    const TCIMValue& notes = Value(disk, "Notes");
-    EXPECT_TRUE(notes.IsNull());
-    EXPECT_TRUE(notes.IsArray());
-
-    const std::vector<TCIMValue>& status = Value(disk, "Status");
-    ASSERT_EQ(status.size(), 3u);
-    EXPECT_EQ(status[0], TCIMValue::Unsigned(T::eUint16, 2));
-    EXPECT_TRUE(status[1].IsNull());
-    EXPECT_EQ(status[2], TCIMValue::Unsigned(T::eUint16, 5));
+    auto dateTime = [](const char* text) {
+        TCIMDateTime value;
+        EXPECT_TRUE(TCIMDateTime::Parse(text, value)) << text;
+        return TCIMValue(value);
+    };
+    const std::pair<const char*, TCIMValue> expected[] = {
+        {"DeviceID", TCIMValue("d1")},
+        {"Size", TCIMValue::Unsigned(T::eUint64, 16)},
+        {"Offset", TCIMValue::Signed(T::eSint8, -128)},
+        {"Ratio", TCIMValue::Real(T::eReal32, 0.5)},
+        {"Online", TCIMValue::Boolean(true)},
+        {"Letter", TCIMValue::Char16("C")},
+        {"Installed", dateTime("20130429103108.458642+060")},
+        {"Uptime", dateTime("00000012030405.000006:000")},
+        {"Coarse", dateTime("2013042910****.******+000")},
+        // A property without VALUE is present, null, and still typed.
+        {"Missing", TCIMValue::Null(T::eUint16)},
+        {"Status", TCIMValue::Array(T::eUint16, {TCIMValue::Unsigned(T::eUint16, 2), TCIMValue::Null(T::eUint16),
+                                                 TCIMValue::Unsigned(T::eUint16, 5)})},
+    };
+    for (const auto& e : expected) EXPECT_EQ(Value(disk, e.first), e.second) << e.first;
+    EXPECT_TRUE(Value(disk, "Notes").IsNull());
+    EXPECT_TRUE(Value(disk, "Notes").IsArray());
 }
 
 TEST(CIMXMLReader, ReferencesKeepTheirPathAndResolveInTheCollection) {
@@ -156,10 +146,7 @@ TEST(CIMXMLReader, ReferencesKeepTheirPathAndResolveInTheCollection) {
     // The instance path's keys (a reference, and a number without TYPE) became class keys.
     const TMemoryClass* cls = loaded.fNamespace->FindClass("X_DiskOnSystem");
     EXPECT_EQ(cls->GetKeyNames(), (std::vector<std::string>{"Disk", "Slot"}));
-    const auto& extra = link.GetExtraKeys();
-    ASSERT_EQ(extra.size(), 1u);
-    EXPECT_EQ(extra[0].first, "Slot");
-    EXPECT_EQ(extra[0].second, TCIMValue::Unsigned(T::eUint64, 7));
+    EXPECT_EQ(link.GetExtraKeys(), (TKeys{{"Slot", TCIMValue::Unsigned(T::eUint64, 7)}}));
 }
 
 const char kSchema[] = R"(<VALUE.OBJECT><QUALIFIER.DECLARATION NAME="ValueMap" TYPE="string" ISARRAY="true" TOSUBCLASS="false">
@@ -251,9 +238,7 @@ TEST(CIMXMLReader, ReadsLenientlyWhatRealFilesHold) {
     EXPECT_EQ(cls->GetProperties().at(cls->FindProperty("Id"))->GetType(), T::eSint32) << "inferred from the XML";
     EXPECT_TRUE(Value(fan, "Rpm").IsNull());
     EXPECT_EQ(Value(fan, "Label"), TCIMValue(""));
-    std::map<std::string, TCIMValue> extra(fan.GetExtraKeys().begin(), fan.GetExtraKeys().end());
-    EXPECT_EQ(extra.at("On"), TCIMValue::Boolean(true));
-    EXPECT_EQ(extra.at("Speed"), TCIMValue::Real(T::eReal64, 2.5));
+    EXPECT_EQ(fan.GetExtraKeys(), (TKeys{{"On", TCIMValue::Boolean(true)}, {"Speed", TCIMValue::Real(T::eReal64, 2.5)}}));
 }
 
 TEST(CIMXMLReader, ServerErrorsAreWarningsAndEmptyResultsAreFine) {
@@ -274,173 +259,133 @@ TEST(CIMXMLReader, ServerErrorsAreWarningsAndEmptyResultsAreFine) {
     EXPECT_TRUE(loaded.fNamespace->GetClasses().empty()) << "names alone load nothing";
 }
 
+// The error loading `xml` fails with; loading it fails the test.
+TLoadError FailureOf(const std::string& xml, const std::string& name = "bad.xml") {
+    try {
+        LoadCollectionFromString(xml, name);
+    } catch (const TLoadError& error) {
+        return error;
+    }
+    ADD_FAILURE() << "loaded: " << xml;
+    return TLoadError("", 0, 0, "loaded");
+}
+
 // Each bad document: the body goes on line 3 of a declaration, '@' marks
 // where the error is reported (it is removed before loading).
-struct TBadCase {
-    const char* fWhat;
+const struct {
     const char* fBody;
     const char* fMessage;
-};
-
-const TBadCase kBadCases[] = {
-    {"bad TYPE", R"(<VALUE.OBJECT><INSTANCE CLASSNAME="A">@<PROPERTY NAME="P" TYPE="int32"/></INSTANCE></VALUE.OBJECT>)",
+} kBadCases[] = {
+    {R"(<VALUE.OBJECT><INSTANCE CLASSNAME="A">@<PROPERTY NAME="P" TYPE="int32"/></INSTANCE></VALUE.OBJECT>)",
      "unknown TYPE \"int32\" of PROPERTY P"},
-    {"reference is no TYPE", R"(<VALUE.OBJECT><CLASS NAME="A">@<PROPERTY NAME="R" TYPE="reference"/></CLASS></VALUE.OBJECT>)",
+    {R"(<VALUE.OBJECT><CLASS NAME="A">@<PROPERTY NAME="R" TYPE="reference"/></CLASS></VALUE.OBJECT>)",
      "unknown TYPE \"reference\" of PROPERTY R"},
-    {"uint8 of 300",
-     R"(<VALUE.OBJECT><INSTANCE CLASSNAME="A"><PROPERTY NAME="Foo" TYPE="uint8">@<VALUE>300</VALUE></PROPERTY></INSTANCE></VALUE.OBJECT>)",
+    {R"(<VALUE.OBJECT><INSTANCE CLASSNAME="A"><PROPERTY NAME="Foo" TYPE="uint8">@<VALUE>300</VALUE></PROPERTY></INSTANCE></VALUE.OBJECT>)",
      "VALUE \"300\" does not fit TYPE uint8 of property Foo (out of range)"},
-    {"bad datetime",
-     R"(<VALUE.OBJECT><INSTANCE CLASSNAME="A"><PROPERTY NAME="T" TYPE="datetime">@<VALUE>2024-01-01 10:00</VALUE></PROPERTY></INSTANCE></VALUE.OBJECT>)",
+    {R"(<VALUE.OBJECT><INSTANCE CLASSNAME="A"><PROPERTY NAME="T" TYPE="datetime">@<VALUE>2024-01-01 10:00</VALUE></PROPERTY></INSTANCE></VALUE.OBJECT>)",
      "VALUE \"2024-01-01 10:00\" does not fit TYPE datetime of property T"},
-    {"bad array element",
-     R"(<VALUE.OBJECT><INSTANCE CLASSNAME="A"><PROPERTY.ARRAY NAME="L" TYPE="boolean"><VALUE.ARRAY><VALUE>TRUE</VALUE>@<VALUE>maybe</VALUE></VALUE.ARRAY></PROPERTY.ARRAY></INSTANCE></VALUE.OBJECT>)",
+    {R"(<VALUE.OBJECT><INSTANCE CLASSNAME="A"><PROPERTY.ARRAY NAME="L" TYPE="boolean"><VALUE.ARRAY><VALUE>TRUE</VALUE>@<VALUE>maybe</VALUE></VALUE.ARRAY></PROPERTY.ARRAY></INSTANCE></VALUE.OBJECT>)",
      "VALUE \"maybe\" does not fit TYPE boolean of property L"},
-    {"element where it cannot stand", R"(<VALUE.OBJECT>@<PROPERTY NAME="P" TYPE="string"/></VALUE.OBJECT>)",
+    {R"(<VALUE.OBJECT>@<PROPERTY NAME="P" TYPE="string"/></VALUE.OBJECT>)",
      "element PROPERTY cannot stand inside VALUE.OBJECT"},
-    {"array value in a scalar property",
-     R"(<VALUE.OBJECT><INSTANCE CLASSNAME="A"><PROPERTY NAME="P" TYPE="string">@<VALUE.ARRAY/></PROPERTY></INSTANCE></VALUE.OBJECT>)",
-     "element VALUE.ARRAY cannot stand inside PROPERTY"},
-    {"two values", R"(<VALUE.OBJECT><INSTANCE CLASSNAME="A"><PROPERTY NAME="P" TYPE="string"><VALUE>a</VALUE>@<VALUE>b</VALUE></PROPERTY></INSTANCE></VALUE.OBJECT>)",
+    {R"(<VALUE.OBJECT><INSTANCE CLASSNAME="A"><PROPERTY NAME="P" TYPE="string"><VALUE>a</VALUE>@<VALUE>b</VALUE></PROPERTY></INSTANCE></VALUE.OBJECT>)",
      "PROPERTY P holds more than one value"},
-    {"unknown element", R"(<VALUE.OBJECT>@<WIDGET/></VALUE.OBJECT>)", "unknown element WIDGET"},
-    {"text between elements", R"(<VALUE.OBJECT><INSTANCE CLASSNAME="A">@oops</INSTANCE></VALUE.OBJECT>)",
+    {R"(<VALUE.OBJECT>@<WIDGET/></VALUE.OBJECT>)", "unknown element WIDGET"},
+    {R"(<VALUE.OBJECT><INSTANCE CLASSNAME="A">@oops</INSTANCE></VALUE.OBJECT>)",
      "text \"oops\" cannot stand inside INSTANCE"},
-    {"missing attribute", R"(<VALUE.OBJECT>@<INSTANCE><PROPERTY NAME="P" TYPE="string"/></INSTANCE></VALUE.OBJECT>)",
+    {R"(<VALUE.OBJECT>@<INSTANCE><PROPERTY NAME="P" TYPE="string"/></INSTANCE></VALUE.OBJECT>)",
      "INSTANCE without CLASSNAME"},
-    {"instance before its name",
-     R"(<VALUE.NAMEDINSTANCE>@<INSTANCE CLASSNAME="A"/><INSTANCENAME CLASSNAME="A"/></VALUE.NAMEDINSTANCE>)",
+    {R"(<VALUE.NAMEDINSTANCE>@<INSTANCE CLASSNAME="A"/><INSTANCENAME CLASSNAME="A"/></VALUE.NAMEDINSTANCE>)",
      "INSTANCE in VALUE.NAMEDINSTANCE must follow its instance path"},
-    {"bad flag", R"(<VALUE.OBJECT><CLASS NAME="A">@<PROPERTY NAME="P" TYPE="string" PROPAGATED="yes"/></CLASS></VALUE.OBJECT>)",
+    {R"(<VALUE.OBJECT><CLASS NAME="A">@<PROPERTY NAME="P" TYPE="string" PROPAGATED="yes"/></CLASS></VALUE.OBJECT>)",
      "attribute PROPAGATED must be true or false, not \"yes\""},
-    {"key that is no number",
-     R"(<VALUE.NAMEDINSTANCE><INSTANCENAME CLASSNAME="A"><KEYBINDING NAME="K">@<KEYVALUE VALUETYPE="numeric">seven</KEYVALUE></KEYBINDING></INSTANCENAME><INSTANCE CLASSNAME="A"/></VALUE.NAMEDINSTANCE>)",
+    {R"(<VALUE.NAMEDINSTANCE><INSTANCENAME CLASSNAME="A"><KEYBINDING NAME="K">@<KEYVALUE VALUETYPE="numeric">seven</KEYVALUE></KEYBINDING></INSTANCENAME><INSTANCE CLASSNAME="A"/></VALUE.NAMEDINSTANCE>)",
      "KEYVALUE \"seven\" of key K is not a number"},
-    {"wrong nesting", R"(<VALUE.OBJECT><INSTANCE CLASSNAME="A"></@VALUE.OBJECT></INSTANCE>)",
+    {R"(<VALUE.OBJECT><INSTANCE CLASSNAME="A"></@VALUE.OBJECT></INSTANCE>)",
      "closing tag does not match the open element INSTANCE"},
 };
 
 TEST(CIMXMLReader, BadInputFailsWithFileLineColumnAndReason) {
-    for (const TBadCase& bad : kBadCases) {
+    for (const auto& bad : kBadCases) {
         std::string body = bad.fBody;
         const size_t mark = body.find('@');
-        ASSERT_NE(mark, std::string::npos) << bad.fWhat;
         body.erase(mark, 1);
-        try {
-            LoadCollectionFromString(Declaration(body), "bad.xml");
-            ADD_FAILURE() << bad.fWhat << ": loaded";
-        } catch (const TLoadError& error) {
-            EXPECT_EQ(error.File(), "bad.xml") << bad.fWhat;
-            EXPECT_EQ(error.Line(), 3u) << bad.fWhat;
-            EXPECT_EQ(error.Column(), mark + 1) << bad.fWhat;
-            EXPECT_EQ(error.Message(), bad.fMessage) << bad.fWhat;
-            EXPECT_EQ(std::string(error.what()),
-                      "bad.xml:3:" + std::to_string(mark + 1) + ": " + bad.fMessage);
-        }
+        EXPECT_STREQ(FailureOf(Declaration(body)).what(),
+                     ("bad.xml:3:" + std::to_string(mark + 1) + ": " + bad.fMessage).c_str());
     }
 }
 
 TEST(CIMXMLReader, TruncatedDocumentNamesTheUnclosedElement) {
     const std::string whole = Declaration(R"(<VALUE.OBJECT><INSTANCE CLASSNAME="A"><PROPERTY NAME="P" TYPE="string"><VALUE>abc</VALUE></PROPERTY></INSTANCE></VALUE.OBJECT>)");
     const std::string cut = whole.substr(0, whole.find("abc") + 3);
-    try {
-        LoadCollectionFromString(cut, "cut.xml");
-        FAIL() << "loaded";
-    } catch (const TLoadError& error) {
-        EXPECT_EQ(error.Line(), 3u);
-        EXPECT_EQ(error.Column(), cut.size() - cut.rfind('\n'));
-        EXPECT_EQ(error.Message(), "unclosed element VALUE: the document ends before it is closed");
-    }
-    try {
-        LoadCollectionFromString(whole.substr(0, whole.find("<PROPERTY") + 5), "cut.xml");
-        FAIL() << "loaded";
-    } catch (const TLoadError& error) {
-        EXPECT_EQ(error.Message(), "the document ends in the middle of a tag or character (unclosed element INSTANCE)");
-    }
+    const TLoadError error = FailureOf(cut);
+    EXPECT_EQ(error.Line(), 3u);
+    EXPECT_EQ(error.Column(), cut.size() - cut.rfind('\n'));
+    EXPECT_EQ(error.Message(), "unclosed element VALUE: the document ends before it is closed");
+    EXPECT_EQ(FailureOf(whole.substr(0, whole.find("<PROPERTY") + 5)).Message(),
+              "the document ends in the middle of a tag or character (unclosed element INSTANCE)");
 }
 
 TEST(CIMXMLReader, NeverLoadsEntitiesOrExternalDefinitions) {
-    const std::string declared = "<?xml version=\"1.0\"?>\n<!DOCTYPE CIM [<!ENTITY boom \"x\">]>\n<CIM/>";
-    EXPECT_THROW(LoadCollectionFromString(declared), TLoadError);
-    try {
-        LoadCollectionFromString(declared);
-    } catch (const TLoadError& error) {
-        EXPECT_EQ(error.Message(), "entity declarations are not accepted (entity boom)");
-        EXPECT_EQ(error.Line(), 2u);
-    }
+    const TLoadError declared = FailureOf("<?xml version=\"1.0\"?>\n<!DOCTYPE CIM [<!ENTITY boom \"x\">]>\n<CIM/>");
+    EXPECT_EQ(declared.Message(), "entity declarations are not accepted (entity boom)");
+    EXPECT_EQ(declared.Line(), 2u);
     // A DOCTYPE naming an external DTD is harmless: it is never fetched.
-    const std::string external = std::string("<?xml version=\"1.0\"?>\n<!DOCTYPE CIM SYSTEM \"http://example.invalid/cim.dtd\">\n") +
-                                 "<CIM CIMVERSION=\"2.0\" DTDVERSION=\"2.0\"><DECLARATION><DECLGROUP/></DECLARATION></CIM>";
-    EXPECT_NO_THROW(LoadCollectionFromString(external));
-    const std::string undeclared = std::string("<?xml version=\"1.0\"?>\n<!DOCTYPE CIM SYSTEM \"cim.dtd\">\n") +
-                                   "<CIM CIMVERSION=\"2.0\" DTDVERSION=\"2.0\"><DECLARATION><DECLGROUP><VALUE.OBJECT>"
-                                   "<INSTANCE CLASSNAME=\"A\"><PROPERTY NAME=\"P\" TYPE=\"string\"><VALUE>&ext;</VALUE>"
-                                   "</PROPERTY></INSTANCE></VALUE.OBJECT></DECLGROUP></DECLARATION></CIM>";
-    try {
-        LoadCollectionFromString(undeclared);
-        FAIL() << "loaded";
-    } catch (const TLoadError& error) {
-        EXPECT_EQ(error.Message(), "reference to undeclared entity &ext;");
-    }
+    auto withDoctype = [](const std::string& body) {
+        const std::string document = Declaration(body);
+        return "<?xml version=\"1.0\"?>\n<!DOCTYPE CIM SYSTEM \"http://example.invalid/cim.dtd\">\n" +
+               document.substr(document.find('\n') + 1);
+    };
+    EXPECT_NO_THROW(LoadCollectionFromString(withDoctype("")));
+    EXPECT_EQ(FailureOf(withDoctype(R"(<VALUE.OBJECT><INSTANCE CLASSNAME="A"><PROPERTY NAME="P" TYPE="string"><VALUE>&ext;</VALUE></PROPERTY></INSTANCE></VALUE.OBJECT>)")).Message(),
+              "reference to undeclared entity &ext;");
 }
 
 // ---------------------------------------------------------------- files
 
-class CIMXMLFiles : public ::testing::Test {
-protected:
-    std::string Write(const std::string& name, const std::string& text) {
-        const std::string path = ::testing::TempDir() + "cimxml_reader_" + name;
-        std::ofstream(path, std::ios::binary) << text;
-        fCreated.push_back(path);
-        return path;
-    }
-    void TearDown() override {
-        for (const auto& path : fCreated) std::remove(path.c_str());
-    }
-    std::vector<std::string> fCreated;
-};
+std::string TempPath(const std::string& name) { return ::testing::TempDir() + "cimxml_reader_" + name; }
 
-TEST_F(CIMXMLFiles, SchemaAndInstancesFromSeveralFilesMakeOneCollection) {
-    const std::string schema = Write("schema.xml", Declaration(kSchema));
-    const std::string data = Write("data.xml", Response(kInstances));
-    TLoadResult loaded = LoadCollection({schema, data});
+std::string TempFile(const std::string& name, const std::string& text) {
+    std::ofstream(TempPath(name), std::ios::binary) << text;
+    return TempPath(name);
+}
+
+TEST(CIMXMLFiles, SeveralFilesMakeOneCollectionAndAFailingFileAddsNothing) {
+    const std::string schema = TempFile("schema.xml", Declaration(kSchema));
+    TLoadResult loaded = LoadCollection({schema, TempFile("data.xml", Response(kInstances))});
     const TMemoryClass* disk = loaded.fNamespace->FindClass("X_Disk");
     ASSERT_TRUE(disk);
     EXPECT_TRUE(disk->IsDeclared());
     EXPECT_EQ(disk->GetInstanceCount(), 1u);
     EXPECT_TRUE(disk->IsA(loaded.fNamespace->FindClass("X_Base")));
-
-    TLoadError missing("", 0, 0, "");
     try {
-        LoadCollection({schema, ::testing::TempDir() + "cimxml_reader_absent.xml"});
+        LoadCollection({schema, TempPath("absent.xml")});
+        ADD_FAILURE() << "loaded";
     } catch (const TLoadError& error) {
-        missing = error;
+        EXPECT_NE(error.Message().find("cannot open file"), std::string::npos) << error.what();
     }
-    EXPECT_NE(missing.Message().find("cannot open file"), std::string::npos) << missing.what();
-}
 
-TEST_F(CIMXMLFiles, AFileThatFailsLeavesTheCollectionAsItWas) {
-    boost::shared_ptr<TMemoryNamespace> ns = LoadCollection({Write("good.xml", Response(kInstances))}).fNamespace;
+    boost::shared_ptr<TMemoryNamespace> ns = LoadCollection({TempPath("data.xml")}).fNamespace;
     const size_t before = ns->GetInstanceCount();
     const size_t classes = ns->GetClasses().size();
     // Valid objects first, then a bad value further down the same file.
-    const std::string bad = Write("bad.xml", Declaration(std::string(kSchema) + "\n" +
-                                                         R"(<VALUE.OBJECT><INSTANCE CLASSNAME="X_New"><PROPERTY NAME="N" TYPE="uint8"><VALUE>256</VALUE></PROPERTY></INSTANCE></VALUE.OBJECT>)"));
+    const std::string bad = TempFile("bad.xml", Declaration(std::string(kSchema) + "\n" +
+                                                            R"(<VALUE.OBJECT><INSTANCE CLASSNAME="X_New"><PROPERTY NAME="N" TYPE="uint8"><VALUE>256</VALUE></PROPERTY></INSTANCE></VALUE.OBJECT>)"));
     std::vector<std::string> warnings;
     try {
         LoadFileInto(*ns, bad, warnings);
-        FAIL() << "loaded";
+        ADD_FAILURE() << "loaded";
     } catch (const TLoadError& error) {
         EXPECT_EQ(error.File(), bad);
-        const std::string schema = kSchema;
-        EXPECT_EQ(error.Line(), 4u + static_cast<unsigned>(std::count(schema.begin(), schema.end(), '\n')));
+        const std::string text = kSchema;
+        EXPECT_EQ(error.Line(), 4u + static_cast<unsigned>(std::count(text.begin(), text.end(), '\n')));
     }
     EXPECT_EQ(ns->GetInstanceCount(), before);
     EXPECT_EQ(ns->GetClasses().size(), classes);
     EXPECT_FALSE(ns->FindClass("X_Disk")->IsDeclared());
-
-    LoadFileInto(*ns, Write("more.xml", Declaration(kSchema)), warnings);
+    LoadFileInto(*ns, schema, warnings);
     EXPECT_TRUE(ns->FindClass("X_Disk")->IsDeclared());
+    for (const char* name : {"schema.xml", "data.xml", "bad.xml"}) std::remove(TempPath(name).c_str());
 }
 
 // ---------------------------------------------------------------- real captures
@@ -469,15 +414,8 @@ TEST(CIMXMLRealCaptures, StorageArrayLoadsAcrossFiles) {
     EXPECT_EQ(loaded.fWarnings[0].rfind(files[5] + ":6: server returned ERROR CODE=5 (The specified class", 0), 0u)
         << loaded.fWarnings[0];
     EXPECT_EQ(loaded.fWarnings[1].rfind(files[12] + ":6: server returned ERROR CODE=5", 0), 0u) << loaded.fWarnings[1];
-
-    const std::pair<const char*, size_t> counts[] = {
-        {"Symm_DiskDrive", 18}, {"Symm_FrontEndFCPort", 12}, {"Symm_FanDevice", 10},
-        {"Symm_StorageProcessorSystem", 8}, {"Symm_PowerDevice", 4}, {"Symm_BatteryDevice", 2},
-        {"Symm_ArrayChassis", 1}, {"Symm_StorageSystem", 1}};
-    for (const auto& count : counts) {
-        ASSERT_TRUE(loaded.fNamespace->FindClass(count.first)) << count.first;
-        EXPECT_EQ(loaded.fNamespace->FindClass(count.first)->GetInstanceCount(), count.second) << count.first;
-    }
+    EXPECT_EQ(loaded.fNamespace->FindClass("Symm_DiskDrive")->GetInstanceCount(), 18u);
+    EXPECT_EQ(loaded.fNamespace->FindClass("Symm_StorageSystem")->GetInstanceCount(), 1u);
     EXPECT_EQ(loaded.fNamespace->GetInstanceCount(), 77u);
 
     // Association ends point into other files; those whose target no file
@@ -495,38 +433,30 @@ TEST(CIMXMLRealCaptures, StorageArrayLoadsAcrossFiles) {
     }
     EXPECT_EQ(resolved, 29u);
     EXPECT_EQ(dangling, 13u);
-
-    // Datetimes of both kinds occur in the storage system.
-    const TMemoryInstance& system = Instance(loaded, "Symm_StorageSystem");
-    size_t timestamps = 0, intervals = 0;
-    for (const auto& slot : system.GetSlots()) {
-        if (slot.fValue.IsNull() || slot.fValue.IsArray() || slot.fValue.GetType() != T::eDateTime) continue;
-        (static_cast<TCIMDateTime>(slot.fValue).IsInterval() ? intervals : timestamps)++;
-    }
-    EXPECT_GT(timestamps, 0u);
-    EXPECT_GT(intervals, 0u);
 }
 
 TEST(CIMXMLRealCaptures, SchemasQualifiersAndEmbeddedObjectsLoad) {
     REQUIRE_REAL_CAPTURES();
+    const struct {
+        const char* file;
+        size_t classes;
+        size_t qualifierTypes;
+    } declarations[] = {{"openpegasus_EnumerateClasses_assoc_classes.xml", 64, 0},
+                        {"openpegasus_schema_declaration.xml", 19, 63},  // 23 declarations, some of one class
+                        {"openpegasus_EnumerateQualifiers.xml", 0, 59},
+                        {"sfcb_EnumerateQualifiers.xml", 0, 71},
+                        {"pywbem_GetClass_CIM_ComputerSystem.xml", 1, 0}};
+    for (const auto& d : declarations) {
+        TLoadResult loaded = LoadCollection({kRealDir + "/" + d.file});
+        EXPECT_EQ(loaded.fNamespace->GetClasses().size(), d.classes) << d.file;
+        EXPECT_EQ(loaded.fNamespace->GetQualifierTypes().size(), d.qualifierTypes) << d.file;
+    }
     TLoadResult assoc = LoadCollection({kRealDir + "/openpegasus_EnumerateClasses_assoc_classes.xml"});
-    EXPECT_EQ(assoc.fNamespace->GetClasses().size(), 64u);
     size_t references = 0;
     for (const TMemoryClass* cls : assoc.fNamespace->GetClasses()) {
         for (const auto& p : cls->GetDeclaration().fProperties) references += p.fType == T::eReference;
     }
     EXPECT_EQ(references, 122u);
-
-    TLoadResult schema = LoadCollection({kRealDir + "/openpegasus_schema_declaration.xml"});
-    EXPECT_EQ(schema.fNamespace->GetQualifierTypes().size(), 63u);
-    EXPECT_EQ(schema.fNamespace->GetClasses().size(), 19u) << "23 declarations, some of one class";
-
-    EXPECT_EQ(LoadCollection({kRealDir + "/openpegasus_EnumerateQualifiers.xml"}).fNamespace->GetQualifierTypes().size(),
-              59u);
-    EXPECT_EQ(LoadCollection({kRealDir + "/sfcb_EnumerateQualifiers.xml"}).fNamespace->GetQualifierTypes().size(), 71u);
-
-    TLoadResult getClass = LoadCollection({kRealDir + "/pywbem_GetClass_CIM_ComputerSystem.xml"});
-    ASSERT_TRUE(getClass.fNamespace->FindClass("CIM_ComputerSystem"));
 
     TLoadResult query = LoadCollection({kRealDir + "/pywbem_ExecQuery_PG_ComputerSystem.xml"});
     const TMemoryInstance& computer = Instance(query, "PG_ComputerSystem");

@@ -10,14 +10,6 @@ using NORVTKR20::TCIMContext;
 
 namespace {
 
-std::string Bool(bool value) {
-    return value ? "true" : "false";
-}
-
-std::string Int(int value) {
-    return std::to_string(value);
-}
-
 std::string Cell(const TTable::TCell& cell) {
     std::string text = cell.monospaced ? "#" : "";
     text += TRecordingWriter::Quote(cell.text);
@@ -43,10 +35,6 @@ std::vector<std::string> TRecordingWriter::CallsStartingWith(const std::string& 
         if (call.compare(0, prefix.size(), prefix) == 0) result.push_back(call);
     }
     return result;
-}
-
-void TRecordingWriter::SetSeparatorText(int separator, const std::string& text) {
-    fSeparators[separator] = text;
 }
 
 void TRecordingWriter::Record(const std::string& name, const std::vector<std::string>& args) {
@@ -119,7 +107,7 @@ std::string TRecordingWriter::Describe(const TReportProperty& property) {
     if (property.HasSecondaryAssociationTarget()) text += " second=" + Quote(property.GetSecondaryAssociationTarget());
     if (property.HasLabelOverride()) text += " label=" + Quote(property.GetLabelOverride());
     if (!property.GetPropertyDefaultValue().empty()) text += " default=" + Quote(property.GetPropertyDefaultValue());
-    if (property.GetArrayValueSeparator() != 0) text += " sep=" + Int(property.GetArrayValueSeparator());
+    if (property.GetArrayValueSeparator() != 0) text += " sep=" + std::to_string(property.GetArrayValueSeparator());
     if (property.IsMonospaced()) text += " mono";
     return text + "}";
 }
@@ -162,104 +150,11 @@ void TRecordingWriter::Initialize(TNamespacePtr /*ns*/, TContext context, const 
     Record("Initialize", {Quote(outputPath), "mode=" + Quote(fMode)});
 }
 
-void TRecordingWriter::StartReport() { Record("StartReport"); }
-void TRecordingWriter::EndCategory() { Record("EndCategory"); }
-void TRecordingWriter::WriteCategory(const std::string& categoryName) { Record("WriteCategory", {Quote(categoryName)}); }
-void TRecordingWriter::EndReport() { Record("EndReport"); }
-
-std::string TRecordingWriter::GetInventoryPage() {
-    Record("GetInventoryPage");
-    return fInventoryPage;
-}
-
 void TRecordingWriter::WriteHalcyonEventLog(const std::vector<TInstancePtr>& records, const std::string& fileStem,
                                             const std::string& title) {
     std::string list = "[";
     for (size_t i = 0; i < records.size(); ++i) list += (i > 0 ? "," : "") + Describe(records[i]);
     Record("WriteHalcyonEventLog", {list + "]", Quote(fileStem), Quote(title)});
-}
-
-void TRecordingWriter::WriteEventLogReport(TReportParameters params) { Record("WriteEventLogReport", {Describe(params)}); }
-void TRecordingWriter::WriteMergedLogPage(TReportParameters params) { Record("WriteMergedLogPage", {Describe(params)}); }
-void TRecordingWriter::WriteMelodyPrologue(const std::string& headerText) { Record("WriteMelodyPrologue", {Quote(headerText)}); }
-
-void TRecordingWriter::WriteMelodyDeviceRow(TInstancePtr device, const std::string& score, const std::string& type,
-                                            const std::string& cimType, const std::string& propertyName,
-                                            const std::string& value, const std::string& frequency,
-                                            const std::string& commonValues, int commonFrequencies) {
-    Record("WriteMelodyDeviceRow", {Describe(device), Quote(score), Quote(type), Quote(cimType), Quote(propertyName),
-                                    Quote(value), Quote(frequency), Quote(commonValues), Int(commonFrequencies)});
-}
-
-void TRecordingWriter::WriteMelodyTableStart() { Record("WriteMelodyTableStart"); }
-void TRecordingWriter::WriteDriveHealthEntry(TPropertyPtr rawData) { Record("WriteDriveHealthEntry", {Describe(rawData)}); }
-void TRecordingWriter::WriteDeclarationHeader(TPropertyDeclPtr declaration) {
-    Record("WriteDeclarationHeader", {Describe(declaration)});
-}
-void TRecordingWriter::WriteDriveHealthValue(TInstancePtr instance, TPropertyPtr property) {
-    Record("WriteDriveHealthValue", {Describe(instance), Describe(property)});
-}
-void TRecordingWriter::WriteRegisterValue(TInstancePtr instance, TPropertyPtr property) {
-    Record("WriteRegisterValue", {Describe(instance), Describe(property)});
-}
-void TRecordingWriter::OpenPage(const std::string& path) { Record("OpenPage", {Quote(path)}); }
-void TRecordingWriter::ClosePage() { Record("ClosePage"); }
-void TRecordingWriter::WritePageHeader() { Record("WritePageHeader"); }
-void TRecordingWriter::WritePageFooter() { Record("WritePageFooter"); }
-void TRecordingWriter::WriteReportTitle(const std::string& title, const std::string& link, const std::string& linkText) {
-    Record("WriteReportTitle", {Quote(title), Quote(link), Quote(linkText)});
-}
-void TRecordingWriter::WriteReportTitleWithLink(const std::string& title, const std::string& link,
-                                                const std::string& linkText) {
-    Record("WriteReportTitleWithLink", {Quote(title), Quote(link), Quote(linkText)});
-}
-void TRecordingWriter::WriteIndexEntry(const std::string& linkName, const std::string& reportName, const bool& hasData) {
-    Record("WriteIndexEntry", {Quote(linkName), Quote(reportName), Bool(hasData)});
-}
-void TRecordingWriter::WriteTableBreak() { Record("WriteTableBreak"); }
-void TRecordingWriter::WriteTableTitle(const std::string& title, const bool& a, const bool& b) {
-    Record("WriteTableTitle", {Quote(title), Bool(a), Bool(b)});
-}
-void TRecordingWriter::StartColumnTable(const std::string& tableWidth, const std::string& summary, bool sortable) {
-    Record("StartColumnTable", {Quote(tableWidth), Quote(summary), Bool(sortable)});
-}
-void TRecordingWriter::StartPropertyTable(const std::string& tableWidth, const std::string& headerWidth,
-                                          const std::string& title) {
-    Record("StartPropertyTable", {Quote(tableWidth), Quote(headerWidth), Quote(title)});
-}
-void TRecordingWriter::WriteHeaderCell(TClassPtr cls, TReportProperty property) {
-    Record("WriteHeaderCell", {Describe(cls), Describe(property)});
-}
-void TRecordingWriter::EndTableHeader() { Record("EndTableHeader"); }
-void TRecordingWriter::StartRow(const bool& first) { Record("StartRow", {Bool(first)}); }
-void TRecordingWriter::EndRow() { Record("EndRow"); }
-void TRecordingWriter::EndTable() { Record("EndTable"); }
-void TRecordingWriter::WriteRowBreak(int span) { Record("WriteRowBreak", {Int(span)}); }
-void TRecordingWriter::WriteTableGrid(TTable& table) { Record("WriteTableGrid", {Describe(table)}); }
-void TRecordingWriter::WriteValueCell(TInstancePtr instance, TReportProperty property, std::string text) {
-    Record("WriteValueCell", {Describe(instance), Describe(property), Quote(text)});
-}
-void TRecordingWriter::WriteTextCell(TReportProperty property, std::string text, std::string link) {
-    Record("WriteTextCell", {Describe(property), Quote(text), Quote(link)});
-}
-void TRecordingWriter::WriteMessageCell(TReportProperty property, const std::string& message) {
-    Record("WriteMessageCell", {Describe(property), Quote(message)});
-}
-void TRecordingWriter::WriteSensorCell(TInstancePtr sensor, const std::string& readingProperty,
-                                       const std::string& modifierProperty) {
-    Record("WriteSensorCell", {Describe(sensor), Quote(readingProperty), Quote(modifierProperty)});
-}
-void TRecordingWriter::WriteSortScript() { Record("WriteSortScript"); }
-
-std::string TRecordingWriter::EscapeText(std::string text) {
-    Record("EscapeText", {Quote(text)});
-    return text;
-}
-
-std::string TRecordingWriter::GetSeparatorText(int separator) {
-    Record("GetSeparatorText", {Int(separator)});
-    std::map<int, std::string>::const_iterator entry = fSeparators.find(separator);
-    return entry == fSeparators.end() ? ", " : entry->second;
 }
 
 }  // namespace testing

@@ -47,7 +47,7 @@ public:
     // --- answers of the operations that return something ---
     void SetInventoryPage(const std::string& text) { fInventoryPage = text; }
     // Separator texts by number; numbers without one get ", ".
-    void SetSeparatorText(int separator, const std::string& text);
+    void SetSeparatorText(int separator, const std::string& text) { fSeparators[separator] = text; }
 
     // --- the state the driver set, for assertions ---
     const TNamespacePtr& Namespace() const { return fNamespace; }
@@ -68,61 +68,105 @@ public:
     static std::string Describe(const TReportParameters& params);
     static std::string Describe(const TTable& table);
 
-    // --- the back-end operations ---
+    // --- the back-end operations: each records its call ---
     // Sets fOutputPath from `outputPath` and fMode from the context key
     // "mode" ("default" without it); the writer type is the constructor's.
     void Initialize(TNamespacePtr ns, TContext context, const std::string& outputPath) override;
-    void StartReport() override;
-    void EndCategory() override;
-    void WriteCategory(const std::string& categoryName) override;
-    void EndReport() override;
-    std::string GetInventoryPage() override;
+    void StartReport() override { Record("StartReport"); }
+    void EndCategory() override { Record("EndCategory"); }
+    void WriteCategory(const std::string& categoryName) override { Record("WriteCategory", {Quote(categoryName)}); }
+    void EndReport() override { Record("EndReport"); }
+    std::string GetInventoryPage() override {
+        Record("GetInventoryPage");
+        return fInventoryPage;
+    }
     void WriteHalcyonEventLog(const std::vector<TInstancePtr>& records, const std::string& fileStem,
                               const std::string& title) override;
-    void WriteEventLogReport(TReportParameters params) override;
-    void WriteMergedLogPage(TReportParameters params) override;
-    void WriteMelodyPrologue(const std::string& headerText) override;
+    void WriteEventLogReport(TReportParameters params) override { Record("WriteEventLogReport", {Describe(params)}); }
+    void WriteMergedLogPage(TReportParameters params) override { Record("WriteMergedLogPage", {Describe(params)}); }
+    void WriteMelodyPrologue(const std::string& headerText) override {
+        Record("WriteMelodyPrologue", {Quote(headerText)});
+    }
     void WriteMelodyDeviceRow(TInstancePtr device, const std::string& score, const std::string& type,
                               const std::string& cimType, const std::string& propertyName, const std::string& value,
                               const std::string& frequency, const std::string& commonValues,
-                              int commonFrequencies) override;
-    void WriteMelodyTableStart() override;
-    void WriteDriveHealthEntry(TPropertyPtr rawData) override;
-    void WriteDeclarationHeader(TPropertyDeclPtr declaration) override;
-    void WriteDriveHealthValue(TInstancePtr instance, TPropertyPtr property) override;
-    void WriteRegisterValue(TInstancePtr instance, TPropertyPtr property) override;
-    void OpenPage(const std::string& path) override;
-    void ClosePage() override;
-    void WritePageHeader() override;
-    void WritePageFooter() override;
-    void WriteReportTitle(const std::string& title, const std::string& link, const std::string& linkText) override;
+                              int commonFrequencies) override {
+        Record("WriteMelodyDeviceRow", {Describe(device), Quote(score), Quote(type), Quote(cimType),
+                                        Quote(propertyName), Quote(value), Quote(frequency), Quote(commonValues),
+                                        std::to_string(commonFrequencies)});
+    }
+    void WriteMelodyTableStart() override { Record("WriteMelodyTableStart"); }
+    void WriteDriveHealthEntry(TPropertyPtr rawData) override { Record("WriteDriveHealthEntry", {Describe(rawData)}); }
+    void WriteDeclarationHeader(TPropertyDeclPtr declaration) override {
+        Record("WriteDeclarationHeader", {Describe(declaration)});
+    }
+    void WriteDriveHealthValue(TInstancePtr instance, TPropertyPtr property) override {
+        Record("WriteDriveHealthValue", {Describe(instance), Describe(property)});
+    }
+    void WriteRegisterValue(TInstancePtr instance, TPropertyPtr property) override {
+        Record("WriteRegisterValue", {Describe(instance), Describe(property)});
+    }
+    void OpenPage(const std::string& path) override { Record("OpenPage", {Quote(path)}); }
+    void ClosePage() override { Record("ClosePage"); }
+    void WritePageHeader() override { Record("WritePageHeader"); }
+    void WritePageFooter() override { Record("WritePageFooter"); }
+    void WriteReportTitle(const std::string& title, const std::string& link, const std::string& linkText) override {
+        Record("WriteReportTitle", {Quote(title), Quote(link), Quote(linkText)});
+    }
     void WriteReportTitleWithLink(const std::string& title, const std::string& link,
-                                  const std::string& linkText) override;
-    void WriteIndexEntry(const std::string& linkName, const std::string& reportName, const bool& hasData) override;
-    void WriteTableBreak() override;
-    void WriteTableTitle(const std::string& title, const bool& a, const bool& b) override;
-    void StartColumnTable(const std::string& tableWidth, const std::string& summary, bool sortable) override;
+                                  const std::string& linkText) override {
+        Record("WriteReportTitleWithLink", {Quote(title), Quote(link), Quote(linkText)});
+    }
+    void WriteIndexEntry(const std::string& linkName, const std::string& reportName, const bool& hasData) override {
+        Record("WriteIndexEntry", {Quote(linkName), Quote(reportName), Flag(hasData)});
+    }
+    void WriteTableBreak() override { Record("WriteTableBreak"); }
+    void WriteTableTitle(const std::string& title, const bool& a, const bool& b) override {
+        Record("WriteTableTitle", {Quote(title), Flag(a), Flag(b)});
+    }
+    void StartColumnTable(const std::string& tableWidth, const std::string& summary, bool sortable) override {
+        Record("StartColumnTable", {Quote(tableWidth), Quote(summary), Flag(sortable)});
+    }
     void StartPropertyTable(const std::string& tableWidth, const std::string& headerWidth,
-                            const std::string& title) override;
-    void WriteHeaderCell(TClassPtr cls, TReportProperty property) override;
-    void EndTableHeader() override;
-    void StartRow(const bool& first) override;
-    void EndRow() override;
-    void EndTable() override;
-    void WriteRowBreak(int span) override;
-    void WriteTableGrid(TTable& table) override;
-    void WriteValueCell(TInstancePtr instance, TReportProperty property, std::string text) override;
-    void WriteTextCell(TReportProperty property, std::string text, std::string link) override;
-    void WriteMessageCell(TReportProperty property, const std::string& message) override;
+                            const std::string& title) override {
+        Record("StartPropertyTable", {Quote(tableWidth), Quote(headerWidth), Quote(title)});
+    }
+    void WriteHeaderCell(TClassPtr cls, TReportProperty property) override {
+        Record("WriteHeaderCell", {Describe(cls), Describe(property)});
+    }
+    void EndTableHeader() override { Record("EndTableHeader"); }
+    void StartRow(const bool& first) override { Record("StartRow", {Flag(first)}); }
+    void EndRow() override { Record("EndRow"); }
+    void EndTable() override { Record("EndTable"); }
+    void WriteRowBreak(int span) override { Record("WriteRowBreak", {std::to_string(span)}); }
+    void WriteTableGrid(TTable& table) override { Record("WriteTableGrid", {Describe(table)}); }
+    void WriteValueCell(TInstancePtr instance, TReportProperty property, std::string text) override {
+        Record("WriteValueCell", {Describe(instance), Describe(property), Quote(text)});
+    }
+    void WriteTextCell(TReportProperty property, std::string text, std::string link) override {
+        Record("WriteTextCell", {Describe(property), Quote(text), Quote(link)});
+    }
+    void WriteMessageCell(TReportProperty property, const std::string& message) override {
+        Record("WriteMessageCell", {Describe(property), Quote(message)});
+    }
     void WriteSensorCell(TInstancePtr sensor, const std::string& readingProperty,
-                         const std::string& modifierProperty) override;
-    void WriteSortScript() override;
+                         const std::string& modifierProperty) override {
+        Record("WriteSensorCell", {Describe(sensor), Quote(readingProperty), Quote(modifierProperty)});
+    }
+    void WriteSortScript() override { Record("WriteSortScript"); }
     // Answers the text unchanged.
-    std::string EscapeText(std::string text) override;
-    std::string GetSeparatorText(int separator) override;
+    std::string EscapeText(std::string text) override {
+        Record("EscapeText", {Quote(text)});
+        return text;
+    }
+    std::string GetSeparatorText(int separator) override {
+        Record("GetSeparatorText", {std::to_string(separator)});
+        return fSeparators.count(separator) ? fSeparators[separator] : ", ";
+    }
 
 private:
     void Record(const std::string& name, const std::vector<std::string>& args = std::vector<std::string>());
+    static std::string Flag(bool value) { return value ? "true" : "false"; }
 
     std::string fConfiguredType;
     std::vector<std::string> fCalls;

@@ -17,55 +17,27 @@ using NORVTKR20::TCIMReference;
 using NORVTKR20::TCIMValue;
 typedef TCIMValue::TCIMType TType;
 
-TProp Str(const std::string& name, const std::string& text) {
+namespace {
+
+TProp Make(const std::string& name, const TCIMValue& value, TType::ECIMType type, bool isArray = false) {
     TProp p;
     p.fName = name;
-    p.fValue = TCIMValue(text);
-    p.fType = TType::eString;
+    p.fValue = value;
+    p.fType = type;
+    p.fIsArray = isArray;
     return p;
 }
 
-TProp U16(const std::string& name, unsigned short value) {
-    TProp p;
-    p.fName = name;
-    p.fValue = TCIMValue(value);
-    p.fType = TType::eUint16;
-    return p;
-}
+}  // namespace
 
-TProp U32(const std::string& name, unsigned int value) {
-    TProp p;
-    p.fName = name;
-    p.fValue = TCIMValue(value);
-    p.fType = TType::eUint32;
-    return p;
-}
+TProp Str(const std::string& name, const std::string& text) { return Make(name, TCIMValue(text), TType::eString); }
 
-TProp Bool(const std::string& name, bool value) {
-    TProp p;
-    p.fName = name;
-    p.fValue = TCIMValue::Boolean(value);
-    p.fType = TType::eBoolean;
-    return p;
-}
+TProp U32(const std::string& name, unsigned int value) { return Make(name, TCIMValue(value), TType::eUint32); }
 
 TProp StrArray(const std::string& name, const std::vector<std::string>& texts) {
     std::vector<TCIMValue> elements;
     for (const std::string& text : texts) elements.push_back(TCIMValue(text));
-    TProp p;
-    p.fName = name;
-    p.fValue = TCIMValue::Array(TType::eString, elements);
-    p.fType = TType::eString;
-    p.fIsArray = true;
-    return p;
-}
-
-TProp NullOf(const std::string& name, TType::ECIMType type) {
-    TProp p;
-    p.fName = name;
-    p.fValue = TCIMValue::Null(type);
-    p.fType = type;
-    return p;
+    return Make(name, TCIMValue::Array(TType::eString, elements), TType::eString, true);
 }
 
 namespace {
@@ -177,14 +149,8 @@ TCIMValue Scalar(TLineReader& reader, TType::ECIMType type, const std::string& t
 }
 
 TProp ReadValue(TLineReader& reader, const std::string& name) {
-    TProp p;
-    p.fName = name;
     bool quoted = false;
-    if (reader.Peek('"')) {
-        p.fValue = TCIMValue(reader.Word(quoted));
-        p.fType = TType::eString;
-        return p;
-    }
+    if (reader.Peek('"')) return Make(name, TCIMValue(reader.Word(quoted)), TType::eString);
     // A bare word, or a type name before ':' or '[]:'.
     std::string head = reader.Head();
     if (reader.Peek('[')) {
@@ -197,32 +163,21 @@ TProp ReadValue(TLineReader& reader, const std::string& name) {
             if (!elements.empty()) reader.Expect(',');
             elements.push_back(Scalar(reader, type, reader.Word(quoted)));
         } while (reader.Peek(','));
-        p.fValue = TCIMValue::Array(type, elements);
-        p.fType = type;
-        p.fIsArray = true;
-        return p;
+        return Make(name, TCIMValue::Array(type, elements), type, true);
     }
     if (reader.Peek(':')) {
         reader.Expect(':');
         std::string text = reader.Word(quoted);
         if (head == "null") {
-            p.fType = TypeNamed(reader, text);
-            p.fValue = TCIMValue::Null(p.fType);
-            return p;
+            TType::ECIMType type = TypeNamed(reader, text);
+            return Make(name, TCIMValue::Null(type), type);
         }
-        p.fType = TypeNamed(reader, head);
-        p.fValue = Scalar(reader, p.fType, text);
-        return p;
+        TType::ECIMType type = TypeNamed(reader, head);
+        return Make(name, Scalar(reader, type, text), type);
     }
-    if (head == "true" || head == "false") {
-        p.fType = TType::eBoolean;
-        p.fValue = TCIMValue::Boolean(head == "true");
-        return p;
-    }
+    if (head == "true" || head == "false") return Make(name, TCIMValue::Boolean(head == "true"), TType::eBoolean);
     if (!head.empty() && head.find_first_not_of("0123456789") == std::string::npos) {
-        p.fType = TType::eUint32;
-        p.fValue = Scalar(reader, p.fType, head);
-        return p;
+        return Make(name, Scalar(reader, TType::eUint32, head), TType::eUint32);
     }
     reader.Fail("cannot read the value of " + name + ": \"" + head + "\"");
 }

@@ -31,11 +31,8 @@ typedef repository::TPropertyValue TProp;
 
 // Property values by type.
 TProp Str(const std::string& name, const std::string& text);
-TProp U16(const std::string& name, unsigned short value);
 TProp U32(const std::string& name, unsigned int value);
-TProp Bool(const std::string& name, bool value);
 TProp StrArray(const std::string& name, const std::vector<std::string>& texts);
-TProp NullOf(const std::string& name, NORVTKR20::TCIMValue::TCIMType::ECIMType type);
 
 class TRepoBuilder {
 public:
