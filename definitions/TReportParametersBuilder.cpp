@@ -1,4 +1,5 @@
 #include "braigrion/TReportParametersBuilder.h"
+#include "braigrion/Trace.h"
 
 #include <vector>
 
@@ -20,14 +21,6 @@ using NORVTKR20::TRootObject;
 using NORVTKR20::TTKRException;
 
 namespace {
-
-void Trace(const std::string& line) {
-    TRootObject::GetCoreLogger()->Log(3, line);
-}
-
-bool IsNotFound(const TTKRException& ex) {
-    return ex.fStatusCode.fStatusCode == NORVTKR20::kNotFound;
-}
 
 const char* const kWindowsEventRecordClasses[] = {
     "ORVSG_WindowsSystemEventLogRecord",

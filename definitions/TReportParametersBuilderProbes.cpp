@@ -6,6 +6,7 @@
 #include <vector>
 
 #include "braigrion/TReportParametersBuilder.h"
+#include "braigrion/Trace.h"
 #include "tkrcore/Callbacks.h"
 #include "tkrcore/TCIMSchemaHelper.h"
 #include "tkrcore/TRootObject.h"
@@ -25,14 +26,6 @@ using NORVTKR20::TTKRException;
 namespace {
 
 typedef std::vector<boost::shared_ptr<ICIMInstance>> TInstances;
-
-void Trace(const std::string& line) {
-    TRootObject::GetCoreLogger()->Log(3, line);
-}
-
-bool IsNotFound(const TTKRException& ex) {
-    return ex.fStatusCode.fStatusCode == NORVTKR20::kNotFound;
-}
 
 // The instances of a class, deep. Throws status 15 when the class is absent.
 TInstances InstancesOf(const TReportParametersBuilder& builder, const std::string& className) {

@@ -4,7 +4,7 @@
 
 #include <string>
 
-#include "tkrcore/TRootObject.h"
+#include "braigrion/Trace.h"
 
 namespace braigrion {
 namespace generators {
@@ -16,10 +16,6 @@ const char kEntering[] = " -- Entering";
 const char kExiting[] = " -- Exiting";
 const char kDeltaDoNothing[] = " -- Under DELTA mode [Do Nothing]";
 const char kDeltaDoComparison[] = " -- Under DELTA mode [Do Comparison]";
-
-inline void Trace(const std::string& line) {
-    NORVTKR20::TRootObject::GetCoreLogger()->Log(3, line);
-}
 
 // The plain form of a generator: outside delta mode `write` writes the page;
 // in delta mode the generator says that it does nothing.

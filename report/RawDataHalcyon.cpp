@@ -21,7 +21,7 @@ struct THalcyonPage {
 };
 
 const THalcyonPage kController = {"TWriter::WriteHalcyonRawDataReport", "ORVSG_hcRawData", "hc_rawData_index",
-                                  "Halcyon Raw Data Information", "hc_RawData_Results_", kTraceLevel};
+                                  "Halcyon Raw Data Information", "hc_RawData_Results_", 3};
 const THalcyonPage kManager = {"TWriter::WriteHalcyonManagerRawDataReport", "ORVSG_hcManagerRawData",
                                "hcmanager_rawData_index", "Halcyon Manager Raw Data Infomation",
                                "hc_Manager_RawData_Results_", 2};
@@ -34,7 +34,7 @@ std::string WriteHalcyonPage(TWriter& writer, const TWriter::TNamespacePtr& ns, 
     try {
         instances = InstancesOf(ns, page.className);
     } catch (...) {
-        Trace(name + " -- Exception when getting class " + page.className, page.missingClassLevel);
+        Log(page.missingClassLevel, name + " -- Exception when getting class " + page.className);
         return std::string();
     }
     if (instances.empty()) {

@@ -6,7 +6,6 @@
 #include "braigrion/ReportDefinition.h"
 #include "tkrcore/Callbacks.h"
 #include "tkrcore/TOSSpecific.h"
-#include "tkrcore/TRootObject.h"
 #include "tkrcore/TTKRException.h"
 
 namespace braigrion {
@@ -40,10 +39,6 @@ bool EndsWithNoCase(const std::string& text, const std::string& suffix) {
 }
 
 }  // namespace
-
-void Trace(const std::string& line, int level) {
-    NORVTKR20::TRootObject::GetCoreLogger()->Log(level, line);
-}
 
 TInstances InstancesOf(const TWriter::TNamespacePtr& ns, const std::string& className) {
     TCIMContext context;

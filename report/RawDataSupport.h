@@ -14,15 +14,13 @@
 
 #include "braigrion/TTable.h"
 #include "braigrion/TWriter.h"
+#include "braigrion/Trace.h"
 
 namespace braigrion {
 namespace rawdata {
 
 typedef std::vector<TWriter::TInstancePtr> TInstances;
 
-// Trace lines of the raw-data pages go to the core logger at this level.
-const int kTraceLevel = 3;
-void Trace(const std::string& line, int level = kTraceLevel);
 
 // The statuses of a result file that cannot be opened for writing: access
 // denied, and any other failure.

@@ -1,4 +1,5 @@
 #include "braigrion/TReport.h"
+#include "braigrion/Trace.h"
 
 #include <algorithm>
 #include <cctype>
@@ -23,14 +24,6 @@ using NORVTKR20::TRootObject;
 using NORVTKR20::TTKRException;
 
 namespace {
-
-void Log(int level, const std::string& line) {
-    TRootObject::GetCoreLogger()->Log(level, line);
-}
-
-void Trace(const std::string& line) {
-    Log(3, line);
-}
 
 std::string Upper(std::string text) {
     std::transform(text.begin(), text.end(), text.begin(),

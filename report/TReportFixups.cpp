@@ -5,18 +5,10 @@
 // The repairs are not written yet: each traces its entry and exit and leaves
 // the repository as it is.
 #include "braigrion/TReport.h"
+#include "braigrion/Trace.h"
 
-#include "tkrcore/TRootObject.h"
 
 namespace braigrion {
-
-namespace {
-
-void Trace(const std::string& line) {
-    NORVTKR20::TRootObject::GetCoreLogger()->Log(3, line);
-}
-
-}  // namespace
 
 void TReport::fixCriticalDetailforRaidDiskRemoval() {
     Trace("TReport::fixCriticalDetailforRaidDiskRemoval -- Entering");

@@ -1,4 +1,5 @@
 #include "braigrion/TWriter.h"
+#include "braigrion/Trace.h"
 
 #include "braigrion/ReportDefinition.h"
 #include "tkrcore/TRootObject.h"
@@ -6,14 +7,6 @@
 namespace braigrion {
 
 using NORVTKR20::TRootObject;
-
-namespace {
-
-void Trace(const std::string& line) {
-    TRootObject::GetCoreLogger()->Log(3, line);
-}
-
-}  // namespace
 
 TWriter::TWriter()
     : fOutputPath(""),

@@ -3,6 +3,7 @@
 #include <stdexcept>
 
 #include "braigrion/ReportDefinition.h"
+#include "braigrion/Trace.h"
 #include "braigrion/TWriter.h"
 #include "tkrcore/TRootObject.h"
 
@@ -13,10 +14,6 @@ using NORVTKR20::TRootObject;
 using namespace TKR_REPORT_DEFINITION;
 
 namespace {
-
-void Trace(const std::string& line) {
-    TRootObject::GetCoreLogger()->Log(3, line);
-}
 
 typedef void (TWriter::*TGenerator)(TWriter::TBuilderPtr, std::string);
 

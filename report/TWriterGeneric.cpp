@@ -3,6 +3,7 @@
 #include <algorithm>
 
 #include "braigrion/ReportDefinition.h"
+#include "braigrion/Trace.h"
 #include "braigrion/TWriter.h"
 #include "braigrion/TWriterUtil.h"
 #include "tkrcore/TOSSpecific.h"
@@ -23,10 +24,6 @@ const char kErrorLogName[] = "TKR Error Log";
 // Memory modules have pages of their own; the FRU table leaves them out.
 const char kDimm[] = "DIMM";
 const std::vector<TWriter::TInstancePtr>::size_type kSPDGroup = 8;
-
-void Trace(const std::string& line) {
-    TRootObject::GetCoreLogger()->Log(3, line);
-}
 
 std::string TextOf(const boost::shared_ptr<ICIMInstance>& instance, const std::string& property) {
     TCIMContext context;

@@ -5,6 +5,7 @@
 #include <sstream>
 
 #include "braigrion/TWriter.h"
+#include "braigrion/Trace.h"
 #include "braigrion/TWriterUtil.h"
 #include "ValueRendering.h"
 #include "tkrcore/Callbacks.h"
@@ -21,10 +22,6 @@ using NORVTKR20::TRootObject;
 namespace {
 
 typedef std::vector<std::string> TTexts;
-
-void Trace(const std::string& line) {
-    TRootObject::GetCoreLogger()->Log(3, line);
-}
 
 // Completion records of the default disk diagnostics are never shown.
 bool IsLeftOut(const TWriter::TInstancePtr& instance) {

@@ -6,6 +6,7 @@
 #include <numeric>
 
 #include "braigrion/TWriterUtil.h"
+#include "braigrion/Trace.h"
 #include "tkrcore/Callbacks.h"
 #include "tkrcore/TCIMDateTime.h"
 #include "tkrcore/TRootObject.h"
@@ -25,10 +26,6 @@ using NORVTKR20::TRootObject;
 using NORVTKR20::TTKRException;
 
 namespace {
-
-bool IsNotFound(const TTKRException& ex) {
-    return ex.fStatusCode.fStatusCode == NORVTKR20::kNotFound;
-}
 
 bool IsDigit(char c) {
     return c >= '0' && c <= '9';

@@ -6,6 +6,7 @@
 #include <boost/lexical_cast.hpp>
 
 #include "braigrion/TWriter.h"
+#include "braigrion/Trace.h"
 #include "braigrion/TWriterUtil.h"
 #include "ValueRendering.h"
 #include "tkrcore/Callbacks.h"
@@ -22,18 +23,6 @@ using NORVTKR20::TCIMContext;
 using NORVTKR20::TCIMValue;
 using NORVTKR20::TRootObject;
 using NORVTKR20::TTKRException;
-
-namespace {
-
-void Trace(const std::string& line) {
-    TRootObject::GetCoreLogger()->Log(3, line);
-}
-
-bool IsNotFound(const TTKRException& ex) {
-    return ex.fStatusCode.fStatusCode == NORVTKR20::kNotFound;
-}
-
-}  // namespace
 
 
 using rendering::RenderProperty;
