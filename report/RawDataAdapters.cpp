@@ -19,16 +19,8 @@ std::string TWriter::WriteFIORawDataReport(std::string linkName) {
     const std::string name = "TWriter::WriteFIORawDataReport";
     const std::string className = "ORV_FIORawData";
     Trace(name + " -- Entering");
-    TInstances instances;
-    try {
-        instances = InstancesOf(fNamespace, className);
-    } catch (...) {
-        Trace(name + " -- Exception when getting class " + className);
-    }
-    if (instances.empty()) {
-        Trace(name + " -- No instance of class " + className);
-        return std::string();
-    }
+    const TInstances instances = RawDataInstances(fNamespace, name, className);
+    if (instances.empty()) return std::string();
 
     const std::string link = "fio_rawData";
     OpenRawPage(*this, fOutputPath, link, "FIO Raw Data Information", linkName);
@@ -68,16 +60,8 @@ std::string TWriter::WriteEmulexRawDataReport(std::string linkName) {
     const std::string name = "TWriter::WriteEmulexRawDataReport";
     const std::string className = "EMXCNA_RawData";
     Trace(name + " -- Entering");
-    TInstances instances;
-    try {
-        instances = InstancesOf(fNamespace, className);
-    } catch (...) {
-        Trace(name + " -- Exception when getting class " + className);
-    }
-    if (instances.empty()) {
-        Trace(name + " -- No instance of class " + className);
-        return std::string();
-    }
+    const TInstances instances = RawDataInstances(fNamespace, name, className);
+    if (instances.empty()) return std::string();
 
     const std::string link = "emulex_rawData";
     OpenRawPage(*this, fOutputPath, link, "Emulex Raw Data Information", linkName);

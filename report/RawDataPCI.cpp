@@ -30,16 +30,8 @@ const char kLinkOpen[] = "<a href= \"";
 
 std::string TWriter::WritePCIRawDataReport(std::string linkName) {
     Trace(std::string(kName) + " -- Entering");
-    TInstances instances;
-    try {
-        instances = InstancesOf(fNamespace, kClass);
-    } catch (...) {
-        Trace(std::string(kName) + " -- Exception when getting class " + kClass);
-    }
-    if (instances.empty()) {
-        Trace(std::string(kName) + " -- No instance of class " + kClass);
-        return std::string();
-    }
+    const TInstances instances = RawDataInstances(fNamespace, kName, kClass);
+    if (instances.empty()) return std::string();
 
     OpenRawPage(*this, fOutputPath, kLink, kTitle, linkName);
     bool anyRow = false;

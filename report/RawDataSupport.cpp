@@ -48,6 +48,18 @@ TInstances InstancesOf(const TWriter::TNamespacePtr& ns, const std::string& clas
     return instances;
 }
 
+TInstances RawDataInstances(const TWriter::TNamespacePtr& ns, const std::string& function,
+                            const std::string& className) {
+    TInstances instances;
+    try {
+        instances = InstancesOf(ns, className);
+    } catch (...) {
+        Trace(function + " -- Exception when getting class " + className);
+    }
+    if (instances.empty()) Trace(function + " -- No instance of class " + className);
+    return instances;
+}
+
 void OpenRawPage(TWriter& writer, const std::string& outputPath, const std::string& link, const std::string& title,
                  const std::string& standardLink) {
     writer.OpenPage(outputPath + TOSSpecific::kFileSeparator + link);

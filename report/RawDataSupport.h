@@ -39,6 +39,11 @@ extern const char kResultLinkClose[];
 // Throws what the repository throws (a missing class among them).
 TInstances InstancesOf(const TWriter::TNamespacePtr& ns, const std::string& className);
 
+// The instances a raw-data page lists. A class that cannot be read gives
+// none; that, and an empty result, are traced under the page's `function`.
+TInstances RawDataInstances(const TWriter::TNamespacePtr& ns, const std::string& function,
+                            const std::string& className);
+
 // Opens a raw-data page: the page file `link` under `outputPath`, its head,
 // and the title with the switch back to the standard page `standardLink`.
 void OpenRawPage(TWriter& writer, const std::string& outputPath, const std::string& link, const std::string& title,
