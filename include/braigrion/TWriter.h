@@ -163,6 +163,26 @@ public:
     void Generator_TKRErrorLog(TBuilderPtr builder, std::string pageID);
     void Generator_Diablo(TBuilderPtr builder, std::string pageID);
 
+    // --- Log sections (sections/Log*.cpp): event and diagnostic logs, operating system logs ---
+
+    // (end of block)
+
+    // --- Storage sections (sections/LSI*.cpp, Halcyon*.cpp, PMC*.cpp, DriveHealth*.cpp) ---
+
+    // (end of block)
+
+    // --- Platform sections (sections/Firmware*.cpp, Environmentals*.cpp, BIOS*.cpp, KMC*.cpp, VCX*.cpp) ---
+
+    // (end of block)
+
+    // --- Adapter, device analysis and tool output sections (sections/Mellanox*.cpp, ...) ---
+
+    // (end of block)
+
+    // --- Delta comparison (delta/) ---
+
+    // (end of block)
+
     // --- Back-end operations, in slot order ---
 
     virtual ~TWriter();
