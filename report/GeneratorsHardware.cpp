@@ -42,30 +42,30 @@ void TWriter::Generator_PCIInformation(TBuilderPtr builder, std::string pageID) 
         [&] { NotYetGenerated(pageID); });  // WriteGenericDeltaReport(builder->BuildPCIInfoParams())
 }
 
-void TWriter::Generator_FirmwareVPD(TBuilderPtr /*builder*/, std::string pageID) {
+void TWriter::Generator_FirmwareVPD(TBuilderPtr builder, std::string pageID) {
     WriteOrCompare(
         "TWriter::Generator_FirmwareVPD", fProviderType == kDeltaProviderType,
-        [&] { NotYetGenerated(pageID); },   // WriteCustomFirmwareReport(builder, pageID)
+        [&] { WriteCustomFirmwareReport(builder, pageID); },
         [&] { NotYetGenerated(pageID); });  // WriteGenericDeltaReport(builder->BuildFirmwareParams())
 }
 
-void TWriter::Generator_ServProcConfiguration(TBuilderPtr /*builder*/, std::string pageID) {
+void TWriter::Generator_ServProcConfiguration(TBuilderPtr builder, std::string pageID) {
     WriteUnlessDelta("TWriter::Generator_ServProcConfiguration", fProviderType == kDeltaProviderType, [&] {
         if (fKMC) {
-            NotYetGenerated(pageID);  // WriteKMCConfigReport(builder, pageID)
+            WriteKMCConfigReport(builder, pageID);
         } else {
-            NotYetGenerated(pageID);  // WriteGenericReport(builder->BuildServProcConfigParams())
+            WriteGenericReport(builder->BuildServProcConfigParams());
         }
     });
 }
 
-void TWriter::Generator_Environmentals(TBuilderPtr /*builder*/, std::string pageID) {
+void TWriter::Generator_Environmentals(TBuilderPtr builder, std::string pageID) {
     const std::string name = "TWriter::Generator_Environmentals";
     Trace(name + kEntering);
     if (fProviderType == kDeltaProviderType) {
         Trace(name + " -- Under DELTA mode [Do nothing]");
     } else {
-        NotYetGenerated(pageID);  // WriteEnvironmentalsReport(builder, pageID)
+        WriteEnvironmentalsReport(builder, pageID);
     }
     Trace(name + kExiting);
 }
@@ -140,17 +140,17 @@ void TWriter::Generator_VMwareESXi(TBuilderPtr builder, std::string /*pageID*/) 
                      [&] { WriteGenericReport(builder->BuildVmware3iParams()); });
 }
 
-void TWriter::Generator_GlowTrace(TBuilderPtr /*builder*/, std::string pageID) {
+void TWriter::Generator_GlowTrace(TBuilderPtr builder, std::string /*pageID*/) {
     WriteUnlessDelta("TWriter::Generator_GlowTrace", fProviderType == kDeltaProviderType,
-                     [&] { NotYetGenerated(pageID); });  // WriteGenericReport(builder->BuildGlowTraceParams())
+                     [&] { WriteGenericReport(builder->BuildGlowTraceParams()); });
 }
 
-void TWriter::Generator_SelfBIST(TBuilderPtr /*builder*/, std::string pageID) {
+void TWriter::Generator_SelfBIST(TBuilderPtr builder, std::string /*pageID*/) {
     WriteUnlessDelta("TWriter::Generator_SelfBIST", fProviderType == kDeltaProviderType,
-                     [&] { NotYetGenerated(pageID); });  // WriteGenericReport(builder->BuildBISTParams())
+                     [&] { WriteGenericReport(builder->BuildBISTParams()); });
 }
 
-void TWriter::Generator_KMCLicenseKey(TBuilderPtr /*builder*/, std::string pageID) {
+void TWriter::Generator_KMCLicenseKey(TBuilderPtr builder, std::string /*pageID*/) {
     const std::string name = "TWriter::Generator_KMCLicenseKey";
     if (!fKMC) {
         Trace(name + kEntering);
@@ -159,12 +159,12 @@ void TWriter::Generator_KMCLicenseKey(TBuilderPtr /*builder*/, std::string pageI
         return;
     }
     WriteUnlessDelta(name, fProviderType == kDeltaProviderType,
-                     [&] { NotYetGenerated(pageID); });  // WriteGenericReport(builder->BuildKMCLicenseKeyParams())
+                     [&] { WriteGenericReport(builder->BuildKMCLicenseKeyParams()); });
 }
 
 // The BIOS settings page exists only when its collector was switched on
 // through the environment: TKR_BIOSPROVIDER reads "yes" in any case.
-void TWriter::Generator_BIOSSettings(TBuilderPtr /*builder*/, std::string pageID) {
+void TWriter::Generator_BIOSSettings(TBuilderPtr builder, std::string pageID) {
     const std::string name = "TWriter::Generator_BIOSSettings";
     Trace(name + kEntering);
     if (fProviderType == kDeltaProviderType) {
@@ -172,18 +172,18 @@ void TWriter::Generator_BIOSSettings(TBuilderPtr /*builder*/, std::string pageID
     } else if (const char* provider = std::getenv("TKR_BIOSPROVIDER")) {
         std::string value(provider);
         for (char& c : value) c = static_cast<char>(std::tolower(static_cast<unsigned char>(c)));
-        if (value == "yes") NotYetGenerated(pageID);  // WriteBIOSEnumeration(builder, pageID)
+        if (value == "yes") WriteBIOSEnumeration(builder, pageID);
     }
     Trace(name + kExiting);
 }
 
-void TWriter::Generator_VCX(TBuilderPtr /*builder*/, std::string pageID) {
+void TWriter::Generator_VCX(TBuilderPtr builder, std::string pageID) {
     const std::string name = "TWriter::Generator_VCX";
     Trace(name + kEntering);
     if (fProviderType == kDeltaProviderType) {
         Trace(name + " -- Under DELTA mode [Do Nothing, Not Support]");
     } else {
-        NotYetGenerated(pageID);  // WriteVCXReport(builder, pageID)
+        WriteVCXReport(builder, pageID);
     }
     Trace(name + kExiting);
 }

@@ -72,6 +72,12 @@ public:
     TReportParameters BuildPCIInfoParams() const;
     TReportParameters BuildFirmwareParams() const;
 
+    // Service processor pages.
+    TReportParameters BuildServProcConfigParams() const;
+    TReportParameters BuildBISTParams() const;
+    TReportParameters BuildGlowTraceParams() const;
+    TReportParameters BuildKMCLicenseKeyParams() const;
+
 private:
     // The operating system as read from the one instance of the OS class;
     // kOSUnknown when there is not exactly one.

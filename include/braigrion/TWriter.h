@@ -173,6 +173,21 @@ public:
 
     // --- Platform sections (sections/Firmware*.cpp, Environmentals*.cpp, BIOS*.cpp, KMC*.cpp, VCX*.cpp) ---
 
+    // "Firmware/VPD": the firmware elements, BIOS and VPD tables, with the
+    // vendor providers' firmware merged into the shared tables.
+    void WriteCustomFirmwareReport(TBuilderPtr builder, std::string pageID);
+    // "Environmentals": the numeric sensors, or the service processor's
+    // sensors when the first source cannot be read at all.
+    void WriteEnvironmentalsReport(TBuilderPtr builder, std::string pageID);
+    void WriteEnvironmentalsPreferred(TBuilderPtr builder, std::string pageID);
+    void WriteEnvironmentalsBackup(TBuilderPtr builder, std::string pageID);
+    // "BIOS Settings": the system firmware's attributes, sorted by name.
+    void WriteBIOSEnumeration(TBuilderPtr builder, std::string pageID);
+    // "KMC Configuration": the network settings a KMC service processor keeps.
+    void WriteKMCConfigReport(TBuilderPtr builder, std::string pageID);
+    // "VCX Information": a chassis management module's inventory.
+    void WriteVCXReport(TBuilderPtr builder, std::string pageID);
+
     // (end of block)
 
     // --- Adapter, device analysis and tool output sections (sections/Mellanox*.cpp, ...) ---
