@@ -1,5 +1,6 @@
 #include "TBackendWriter.h"
 
+#include <cctype>
 #include <cerrno>
 #include <algorithm>
 #include <cmath>
@@ -257,6 +258,32 @@ void TBackendWriter::WriteMessageCell(TReportProperty /*property*/, const std::s
     AddCell(cell);
 }
 
+namespace {
+
+// The sensor's unit as a reading is spoken: "Degrees C" becomes "degrees C",
+// "Volts" "volts"; a word in capitals ("RPM") stays. "" when the sensor
+// names no unit, or only "Unknown" or "Other".
+std::string SpokenUnit(const TWriter::TInstancePtr& sensor) {
+    std::string unit;
+    try {
+        TCIMContext context;
+        unit = sensor->GetProperty("BaseUnits", context)->GetValueString();
+    } catch (...) {
+        return std::string();
+    }
+    if (unit == "Unknown" || unit == "Other") return std::string();
+    std::string::size_type end = unit.find(' ');
+    if (end == std::string::npos) end = unit.size();
+    bool capitalised = end > 1 && std::isupper(static_cast<unsigned char>(unit[0]));
+    for (std::string::size_type i = 1; i < end && capitalised; ++i) {
+        capitalised = std::islower(static_cast<unsigned char>(unit[i])) != 0;
+    }
+    if (capitalised) unit[0] = static_cast<char>(std::tolower(static_cast<unsigned char>(unit[0])));
+    return unit;
+}
+
+}  // namespace
+
 void TBackendWriter::WriteSensorCell(TInstancePtr sensor, const std::string& readingProperty,
                                      const std::string& modifierProperty) {
     std::string text = "N/A";
@@ -271,6 +298,8 @@ void TBackendWriter::WriteSensorCell(TInstancePtr sensor, const std::string& rea
         char buffer[64];
         std::snprintf(buffer, sizeof buffer, "%g", value);
         text = buffer;
+        const std::string unit = SpokenUnit(sensor);
+        if (!unit.empty()) text += " " + unit;
     } catch (...) {
         text = "N/A";
     }

@@ -75,8 +75,9 @@ public:
     void WriteValueCell(TInstancePtr instance, TReportProperty property, std::string separator) override;
     void WriteTextCell(TReportProperty property, std::string text, std::string link) override;
     void WriteMessageCell(TReportProperty property, const std::string& message) override;
-    // The reading times ten to the power of the modifier; "N/A" when either
-    // cannot be read as a number.
+    // The reading times ten to the power of the modifier, followed by the
+    // sensor's unit as a reading is spoken ("23.75 degrees C"); "N/A" when
+    // either number cannot be read.
     void WriteSensorCell(TInstancePtr sensor, const std::string& readingProperty,
                          const std::string& modifierProperty) override;
     void WriteDeclarationHeader(TPropertyDeclPtr declaration) override;

@@ -33,7 +33,9 @@ CLI::App* AddReportCommand(CLI::App& app, TReportOptions& options) {
     AddRunOptions(*command, options.fRun);
     command->footer(
         "The report is written beside DIR and moved into place when complete; an earlier report in DIR\n"
-        "stays until then. The path of the report's index is printed on standard output.");
+        "stays until then. The path of the report's index is printed on standard output.\n"
+        "Environment: TKR_BIOSPROVIDER=yes (in any case) adds the \"BIOS Settings\" page, for collections\n"
+        "whose BIOS attribute collector was switched on.");
     return command;
 }
 

@@ -135,9 +135,12 @@ void TWriter::WriteEnvironmentalsPreferred(TBuilderPtr builder, std::string /*pa
             for (size_t i = 0; i < kept.size(); ++i) {
                 const int row = static_cast<int>(i) + 1;
                 int col = 0;
+                // A cell shows what the value means: an enumerated unit its
+                // mapped text ("Degrees C"), not its number.
                 auto text = [&](const std::string& property) {
                     try {
-                        return EscapeText(TextOf(kept[i], property));
+                        TCIMContext context;
+                        return EscapeText(kept[i]->GetProperty(property, context)->GetValueString());
                     } catch (const TTKRException&) {
                         return std::string();
                     }

@@ -180,4 +180,30 @@ TEST_F(ReportCommand, PagePrintsOnePageOfTheCollection) {
     EXPECT_TRUE(Entries().empty()) << "the page command writes no files";
 }
 
+// A chassis inventory read with --vcx gets its "VCX Information" page, and
+// TKR_BIOSPROVIDER=yes adds the BIOS settings of a collection that has them.
+TEST_F(ReportCommand, VCXInventoryAndBIOSSettingsPages) {
+    const std::string samples = std::string(BRAIGRION_SOURCE_DIR) + "/samples/";
+    TCommandResult r = RunBraigrion({"report", "--vcx", "-o", Path("vcx"), samples + "vcx-chassis/inventory.xml"});
+    ASSERT_EQ(0, r.fStatus) << r.fErr;
+    const std::string vcx = Slurp(Path("vcx") + "/vcx.html");
+    for (const char* text : {"VCX Information", "Chassis VPD", "<td>9N40</td>", "<td>Y030BG79G01H</td>",
+                             "<td>Chassis Controller Module</td>", "<td>CCM Firmware (Backup)</td>"}) {
+        EXPECT_NE(std::string::npos, vcx.find(text)) << text;
+    }
+
+    std::vector<std::string> files;
+    for (const char* file : {"schema.xml", "inventory.xml", "platform.xml"}) files.push_back(samples + "linux-server/" + file);
+    setenv("TKR_BIOSPROVIDER", "Yes", 1);
+    r = RunBraigrion(Args({"report", "-o", Path("bios")}, files));
+    unsetenv("TKR_BIOSPROVIDER");
+    ASSERT_EQ(0, r.fStatus) << r.fErr;
+    const std::string bios = Slurp(Path("bios") + "/biosenumeration.html");
+    EXPECT_NE(std::string::npos, bios.find("<td>Processors.HyperThreading</td>")) << bios.substr(0, 400);
+    r = RunBraigrion(Args({"report", "-o", Path("plain")}, files));
+    ASSERT_EQ(0, r.fStatus) << r.fErr;
+    EXPECT_FALSE(fs::exists(Path("plain") + "/biosenumeration.html"));
+    EXPECT_EQ(std::string::npos, Slurp(Path("plain") + "/navbar.html").find("BIOS Settings"));
+}
+
 }  // namespace

@@ -118,7 +118,7 @@ TEST(Dispatch, AFailingPageIsContainedAndTheNextPageRuns) {
 
     const std::string transcript = writer.Transcript();
     EXPECT_NE(std::string::npos,
-              transcript.find("WriteIndexEntry(\"pci_info\", \"PCI Information\", true)\npage ServProcConfig\n"));
+              transcript.find("WriteIndexEntry(\"pci_info\", \"PCI Information\", true)\nOpenPage(\"out/servproc_config\")\n"));
     EXPECT_EQ(std::string::npos, transcript.find("page Firmware\n"));
     EXPECT_NE(std::string::npos, transcript.find("page TKRLog\nEndReport()\n"));
 }

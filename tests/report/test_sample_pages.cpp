@@ -55,8 +55,13 @@ std::map<std::string, std::string> WritePages(const std::string& sample) {
     }
     std::sort(files.begin(), files.end());
     TPageRecorder writer("html");
-    TReport report(repository::LoadCollection(files).fNamespace, {}, "out");
-    report.Write(&writer, {});
+    // A KMC machine and a chassis inventory are read as the command's --kmc
+    // and --vcx read them.
+    std::map<std::string, NORVTKR20::TCIMValue> context;
+    if (StartsWith(sample, "kmc")) context["KMC"] = NORVTKR20::TCIMValue(std::string("TRUE"));
+    if (StartsWith(sample, "vcx")) context["VCX"] = NORVTKR20::TCIMValue(std::string("TRUE"));
+    TReport report(repository::LoadCollection(files).fNamespace, context, "out");
+    report.Write(&writer, context);
 
     std::map<std::string, std::string> pages;
     std::string link, page;
@@ -99,9 +104,11 @@ TEST_P(SamplePages, AreWrittenAsExpected) {
 // Windows gets its components, fixes, drivers and services; Linux its
 // packages, modules and configuration files; pre-boot data no operating
 // system pages but the configuration files; a multi-node system has its
-// nodes in a table of their own.
+// nodes in a table of their own; a KMC machine has the KMC forms of the
+// service processor pages, and a chassis inventory its VCX page.
 INSTANTIATE_TEST_SUITE_P(Samples, SamplePages,
-                         ::testing::Values("windows-server", "linux-teaming", "linux-server", "preboot", "multinode"),
+                         ::testing::Values("windows-server", "linux-teaming", "linux-server", "preboot", "multinode",
+                                           "kmc-server", "vcx-chassis"),
                          [](const ::testing::TestParamInfo<const char*>& info) {
                              std::string name = info.param;
                              std::replace(name.begin(), name.end(), '-', '_');
