@@ -1,5 +1,6 @@
 // The "VCX Information" page: the inventory a chassis management module
 // keeps of its chassis, the devices in it and their firmware.
+#include <stdexcept>
 #include <string>
 #include <vector>
 
@@ -43,10 +44,12 @@ struct TChassisVPD {
     std::string uuid;
 };
 
-// Throws std::out_of_range when the text is too short for its fields.
+// Throws std::out_of_range when the text is too short for its fields, or
+// has no "," to find them by.
 TChassisVPD ParseChassisVPD(const std::string& info) {
     TChassisVPD vpd;
     const std::string::size_type c = info.find(',');
+    if (c == std::string::npos) throw std::out_of_range("no ',' in the chassis identifying text: " + info);
     const std::string::size_type k = info.find(':');
     const std::string::size_type l = info.rfind(',');
     vpd.machineType = info.substr(c + 2, 4);

@@ -147,13 +147,17 @@ TEST(VCXInventory, ReportsTheChassisAndItsDevices) {
     EXPECT_EQ(testing::ExpectedPage("platform/vcx.txt", page), page);
 }
 
-// An identifying text too short for its fields abandons the page before it
-// opens; without the inventory classes there is no page at all.
+// An identifying text too short for its fields, or without the "," they are
+// found by, abandons the page before it opens; without the inventory classes
+// there is no page at all.
 TEST(VCXInventory, ShortOrMissingInventoryWritesNoPage) {
-    const std::string broken = WritePage(Repo("ORVSD_ModularComputerSystem OtherIdentifyingInfo=\"{ab}, 87\"\n"
-                                              "class ORVSD_VCXFirmwareIdentity\nclass ORVx_PhysicalPackage\n"),
-                                         PAGE_VCX);
-    EXPECT_EQ(std::string::npos, broken.find("OpenPage")) << broken;
+    for (const char* info : {"{ab}, 87", "{4F2C8A10-77D1-11E9} 9N40HC1:Y030BG79G01H"}) {
+        const std::string broken =
+            WritePage(Repo(std::string("ORVSD_ModularComputerSystem OtherIdentifyingInfo=\"") + info + "\"\n" +
+                           "class ORVSD_VCXFirmwareIdentity\nclass ORVx_PhysicalPackage\n"),
+                      PAGE_VCX);
+        EXPECT_EQ(std::string::npos, broken.find("OpenPage")) << info << "\n" << broken;
+    }
     const std::string missing = WritePage(Repo("class ORVSD_ModularComputerSystem\n"), PAGE_VCX);
     EXPECT_EQ("", missing);
 }
