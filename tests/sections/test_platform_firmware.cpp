@@ -85,12 +85,14 @@ TEST(FirmwarePage, VendorRowsNeedTheirTable) {
 
 // A server whose LSI controllers the Cardinal provider reports: a MegaRAID
 // controller with a drive, a package build and an enclosure, an IR
-// controller whose model is "UNKNOWN", and the legacy elements of a 1030
-// controller (kept) and of a SAS controller (replaced).
+// controller whose model is "UNKNOWN", and the legacy elements (controller
+// and drive firmware) of a 1030 controller (kept) and of a SAS controller
+// (replaced).
 TPlatformRepo CardinalServer() {
     TPlatformRepo repo;
     repo.Keyed("ORVSG_FirmwareElement").Keyed("ORVSG_LSIFirmwareElement", "ORVSG_FirmwareElement");
     repo.Keyed("CIM_BIOSElement").Keyed("ORVSG_LSIBIOSElement", "CIM_BIOSElement");
+    repo.Keyed("ORVSG_LSIDiskFirmwareElement", "ORVSG_FirmwareElement").Keyed("ORVSG_LSIDiskDrive");
     repo.Keyed("ORVSG_LSISCSIProtocolController");
     repo.Keyed("CIM_ComputerSystem").Keyed("LSIESG_MegaRAIDHBA", "CIM_ComputerSystem");
     repo.Keyed("LSIESG_IRController", "CIM_ComputerSystem");
@@ -106,6 +108,10 @@ TPlatformRepo CardinalServer() {
         ORVSG_LSIFirmwareElement Id="old1030" Name="LSI 53C1030 Firmware" Version="1.03.39"
         ORVSG_LSIFirmwareElement Id="oldsas" Name="LSI SAS3008 Firmware" Version="16.00.01"
         ORVSG_LSIBIOSElement Id="oldbios" Name="LSI SAS3008 BIOS" Version="8.37"
+        ORVSG_LSIDiskFirmwareElement Id="disk1030" Name="LSI Disk Firmware, 1030 bus" Version="HPD4"
+        ORVSG_LSIDiskFirmwareElement Id="disksas" Name="LSI Disk Firmware, SAS bus" Version="N003"
+        ORVSG_LSIDiskDrive Id="pd1030"
+        ORVSG_LSIDiskDrive Id="pdsas"
         CIM_BIOSElement Id="uefi" Name="System UEFI" Version="2.31"
         ORVSG_LSISCSIProtocolController Id="c1030" ControllerType="LSI 53C1030"
         ORVSG_LSISCSIProtocolController Id="c3008" ControllerType="SAS3008 IR"
@@ -125,6 +131,13 @@ TPlatformRepo CardinalServer() {
               "ORVSG_LSISCSIProtocolController:c1030");
     repo.Link("ORVSG_LSIControllerFirmwareElement", "ORVSG_LSIFirmwareElement:oldsas",
               "ORVSG_LSISCSIProtocolController:c3008");
+    // Drive firmware belongs to the controller of its drive.
+    repo.Link("ORVSG_LSIDiskFirmware", "ORVSG_LSIDiskFirmwareElement:disk1030", "ORVSG_LSIDiskDrive:pd1030");
+    repo.Link("ORVSG_LSIDiskFirmware", "ORVSG_LSIDiskFirmwareElement:disksas", "ORVSG_LSIDiskDrive:pdsas");
+    repo.Link("ORVSG_LSIProtocolControllerForPhysicalDisk", "ORVSG_LSISCSIProtocolController:c1030",
+              "ORVSG_LSIDiskDrive:pd1030");
+    repo.Link("ORVSG_LSIProtocolControllerForPhysicalDisk", "ORVSG_LSISCSIProtocolController:c3008",
+              "ORVSG_LSIDiskDrive:pdsas");
     repo.Link("ORVSG_LSIControllerBIOSElement", "ORVSG_LSIBIOSElement:oldbios", "ORVSG_LSISCSIProtocolController:c3008");
     repo.Link("LSIESG_SystemPackaging", "LSIESG_MegaRAIDHBA:mr0", "LSIESG_PhysicalCard:card0");
     repo.Link("LSIESG_SystemPackaging", "LSIESG_MegaRAIDHBA:mr0", "LSIESG_EnclosureChassis:enc0");
