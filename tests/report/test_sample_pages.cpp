@@ -55,21 +55,32 @@ std::map<std::string, std::string> WritePages(const std::string& sample) {
     }
     std::sort(files.begin(), files.end());
     TPageRecorder writer("html");
+    // The example lookup files, so that documentation links show.
+    TWriter::TLogLinkSettings links;
+    links.fDataFolder = std::string(BRAIGRION_SOURCE_DIR) + "/data";
+    writer.SetLogLinkSettings(links);
     TReport report(repository::LoadCollection(files).fNamespace, {}, "out");
     report.Write(&writer, {});
 
     std::map<std::string, std::string> pages;
     std::string link, page;
+    // A page whose index line comes before it (the Linux log pages) starts
+    // with that line and ends where it closes.
+    std::string indexFirst;
     for (const std::string& call : writer.Calls()) {
         if (StartsWith(call, "EscapeText(") || StartsWith(call, "GetSeparatorText(")) continue;
+        if (link.empty() && StartsWith(call, "WriteIndexEntry(")) indexFirst = call;
         if (StartsWith(call, "OpenPage(")) {
             link = call.substr(call.find_last_of('/') + 1);
             link = link.substr(0, link.find('"'));
             page.clear();
+            if (StartsWith(indexFirst, "WriteIndexEntry(\"" + link + "\"")) page = indexFirst + "\n";
+            indexFirst.clear();
         }
         if (link.empty()) continue;
         page += call + "\n";
-        if (StartsWith(call, "WriteIndexEntry(")) {
+        const bool indexed = page.compare(0, 16, "WriteIndexEntry(") == 0;
+        if (indexed ? StartsWith(call, "ClosePage(") : StartsWith(call, "WriteIndexEntry(")) {
             EXPECT_EQ(0u, pages.count(link)) << "two pages with the link " << link;
             pages[link] = page;
             link.clear();
@@ -99,9 +110,12 @@ TEST_P(SamplePages, AreWrittenAsExpected) {
 // Windows gets its components, fixes, drivers and services; Linux its
 // packages, modules and configuration files; pre-boot data no operating
 // system pages but the configuration files; a multi-node system has its
-// nodes in a table of their own.
+// nodes in a table of their own; the KMC machine, written without the KMC
+// flag, has its service processor's logs and its diagnostics linked to
+// their documentation.
 INSTANTIATE_TEST_SUITE_P(Samples, SamplePages,
-                         ::testing::Values("windows-server", "linux-teaming", "linux-server", "preboot", "multinode"),
+                         ::testing::Values("windows-server", "linux-teaming", "linux-server", "preboot", "multinode",
+                                           "kmc-server"),
                          [](const ::testing::TestParamInfo<const char*>& info) {
                              std::string name = info.param;
                              std::replace(name.begin(), name.end(), '-', '_');
