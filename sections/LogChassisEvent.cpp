@@ -121,7 +121,7 @@ void TWriter::WriteCustomChassisEventLog(TBuilderPtr builder, std::string /*page
         TInstanceSorter sorter;
         if (multiNode) sorter.AddProperty("NodeID", true, false);
         sorter.AddProperty("CreationTimeStamp", true, false);
-        std::stable_sort(entries.begin(), entries.end(), sorter);
+        TWriterUtil::SortInstances(entries, sorter, true);
 
         const std::string machineType = GetMTFromRepository();
         const bool links = loglinks::IsMachineTypeListed(fLogLinks.fDataFolder, loglinks::kEventsFile, machineType,

@@ -8,6 +8,7 @@
 
 #include "braigrion/TInstanceSorter.h"
 #include "braigrion/TWriter.h"
+#include "braigrion/TWriterUtil.h"
 #include "braigrion/Trace.h"
 #include "tkrcore/Callbacks.h"
 #include "tkrcore/TOSSpecific.h"
@@ -50,7 +51,7 @@ void TWriter::WriteLinuxLogReport(TBuilderPtr /*builder*/, std::string /*pageID*
     cls->EnumerateInstances(TAddToVectorCallback<ICIMInstance>(records), true, TCIMContext());
     TInstanceSorter sorter;
     sorter.AddProperty("RecordID", true, false);
-    std::stable_sort(records.begin(), records.end(), sorter);
+    TWriterUtil::SortInstances(records, sorter, true);
 
     // Each log keeps its records in the order of their ids.
     std::multimap<std::string, TInstancePtr> logs;
