@@ -1,6 +1,6 @@
-// The operating system logs (one page per Linux log file, the Windows event
-// logs and the merged log handed to the back-end whole), the frame of the
-// IPMI page, and which log pages each generator writes in each mode.
+// The operating system logs (one page per Linux log file), the frame of the
+// IPMI page, and which log pages each generator writes in each mode (the
+// Windows event logs and the merged log go to the back-end whole).
 #include <string>
 #include <vector>
 
@@ -45,20 +45,6 @@ TEST(LinuxLogs, WithoutTheClassLeaveAnIndexLineOnly) {
     TLogRun run(repo.Namespace());
     run.writer.WriteLinuxLogReport(BuilderOf(repo), "OSLogs");
     EXPECT_EQ("WriteIndexEntry(\"Event Logs\", \"\", false)\n", run.Transcript());
-}
-
-TEST(OperatingSystemLogs, WindowsAndMergedLogsGoToTheBackEndWhole) {
-    TRepoBuilder repo;
-    TLogRun run(repo.Namespace());
-    run.writer.WriteWindowsEventReport(BuilderOf(repo), "OSLogs");
-    run.writer.WriteMergedLogReport(BuilderOf(repo), "MergedLog");
-    std::vector<std::string> links;
-    for (const std::string& call : run.Calls()) links.push_back(call.substr(0, call.find(" name=")));
-    EXPECT_EQ((std::vector<std::string>{"WriteEventLogReport({link=\"event_application\"",
-                                        "WriteEventLogReport({link=\"event_system\"",
-                                        "WriteEventLogReport({link=\"event_security\"",
-                                        "WriteMergedLogPage({link=\"merged_log\""}),
-              links);
 }
 
 // Without a multi-tool's link the IPMI page is a generic page; with one its

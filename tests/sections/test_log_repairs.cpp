@@ -157,23 +157,6 @@ TEST(Repairs, DriveRemovalHighlightIsRebuiltOrCreated) {
     }
 }
 
-TEST(Repairs, CreatedHighlightCarriesItsRecordFields) {
-    TRepoBuilder repo;
-    repo.Parse(R"(
-        ORVSG_HeavyHittersLogRecord Message="one"
-        ORVSG_HeavyHittersLogRecord Message="two"
-        ORVSG_DLMLog Message="Hard drive 5 removal detected."
-    )");
-    TReport(repo.Namespace(), {}, "out").fixCriticalDetailforRaidDiskRemoval();
-    auto records = testrepo::All(*repo.Namespace(), "ORVSG_HeavyHittersLogRecord");
-    ASSERT_EQ(3u, records.size());
-    for (const char* property : {"CreationClassName", "LogName", "LogCreationClassName"}) {
-        EXPECT_EQ("Test", records[2]->GetProperty(property, {})->GetValue().ToString(10)) << property;
-    }
-    EXPECT_EQ("3", records[2]->GetProperty("RecordID", {})->GetValue().ToString(10));
-    EXPECT_FALSE(records[2]->GetProperty("MessageTimestamp", {})->GetValue().IsNull());
-}
-
 // Not part of a run: fills what a module's SPD left empty from the FRU of
 // the same node and slot.
 TEST(Repairs, MemoryInfoIsFilledFromTheMatchingFRU) {
