@@ -121,7 +121,11 @@ void TWriter::WriteCustomChassisEventLog(TBuilderPtr builder, std::string /*page
         TInstanceSorter sorter;
         if (multiNode) sorter.AddProperty("NodeID", true, false);
         sorter.AddProperty("CreationTimeStamp", true, false);
-        TWriterUtil::SortInstances(entries, sorter, true);
+        try {
+            TWriterUtil::SortInstances(entries, sorter, true);
+        } catch (...) {
+            Trace("TWriter::WriteCustomChassisEventLog -- Exception when sorting, entries left in their order");
+        }
 
         const std::string machineType = GetMTFromRepository();
         const bool links = loglinks::IsMachineTypeListed(fLogLinks.fDataFolder, loglinks::kEventsFile, machineType,
@@ -168,19 +172,14 @@ void TWriter::WriteCustomChassisEventLog(TBuilderPtr builder, std::string /*page
                 }
 
                 StartRow(true);
-                size_t column = 0;
-                if (multiNode) WriteValueCell(entry, columns[column++], "");
-                WriteValueCell(entry, columns[column++], "");  // LogName
-                WriteValueCell(entry, columns[column++], "");  // CreationTimeStamp
-                ++column;
-                WriteTextCell(eventID, id, links ? eventLink : std::string());
-                WriteValueCell(entry, columns[column++], "");  // MessageID
-                WriteValueCell(entry, columns[column++], "");  // Message
-                WriteValueCell(entry, columns[column++], "");  // PerceivedSeverity
-                if (links && !uefiLink.empty()) {
-                    WriteTextCell(auxiliary, auxiliaryText, uefiLink);
-                } else {
-                    WriteValueCell(entry, auxiliary, "");
+                for (const TReportProperty& column : columns) {
+                    if (column.GetProperty() == eventID.GetProperty()) {
+                        WriteTextCell(eventID, id, links ? eventLink : std::string());
+                    } else if (column.GetProperty() == auxiliary.GetProperty() && links && !uefiLink.empty()) {
+                        WriteTextCell(auxiliary, auxiliaryText, uefiLink);
+                    } else {
+                        WriteValueCell(entry, column, "");
+                    }
                 }
                 EndRow();
             } catch (...) {

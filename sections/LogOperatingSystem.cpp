@@ -51,7 +51,11 @@ void TWriter::WriteLinuxLogReport(TBuilderPtr /*builder*/, std::string /*pageID*
     cls->EnumerateInstances(TAddToVectorCallback<ICIMInstance>(records), true, TCIMContext());
     TInstanceSorter sorter;
     sorter.AddProperty("RecordID", true, false);
-    TWriterUtil::SortInstances(records, sorter, true);
+    try {
+        TWriterUtil::SortInstances(records, sorter, true);
+    } catch (...) {
+        Trace("TWriter::WriteLinuxLogReport -- Exception when sorting, records left in their order");
+    }
 
     // Each log keeps its records in the order of their ids.
     std::multimap<std::string, TInstancePtr> logs;
