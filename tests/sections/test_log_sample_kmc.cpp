@@ -1,7 +1,8 @@
 // The KMC sample machine written the way its service processor's logs are
 // read on a KMC system: with the KMC flag and in LUZ mode, where the IPMI
 // page carries the parser's output and the raw records, and the DCAP log
-// exists. Its pages are compared with tests/fixtures/pages/kmc-server-luz/.
+// exists (tests/fixtures/pages/kmc-server-luz/); and the pre-boot sample's
+// system inventory of the same logs (tests/fixtures/pages/preboot-inventory/).
 #include <algorithm>
 #include <filesystem>
 #include <string>
@@ -90,6 +91,21 @@ TEST(KMCSample, IsRepairedBeforeItsPages) {
                         "Check Halcyon or DLM Event or IPMI Event  for more infomation.\""))
         << page;
     EXPECT_EQ("4712", writer.GetMTFromRepository());
+}
+
+// The pre-boot edition's system inventory shows the service processor's
+// logs in their inventory form: with the KMC flag the IPMI events without
+// their auxiliary log, then the chassis event log.
+TEST(PrebootSample, InventoryShowsTheKMCFormOfTheIPMIPage) {
+    TGridRecorder writer(TKR_REPORT_DEFINITION::TKR_WRITER_TYPE_INVENTORY);
+    std::map<std::string, NORVTKR20::TCIMValue> context;
+    context["pageID"] = NORVTKR20::TCIMValue(std::string("KMCLogs"));
+    context["KMC"] = NORVTKR20::TCIMValue(std::string("TRUE"));
+    TReport report(repository::LoadCollection(SampleFiles("preboot")).fNamespace, context, "out");
+    report.GetPage(&writer, context);
+    const std::string page = PageOf(writer.Calls(), "ipmi_event");
+    EXPECT_EQ(testing::ExpectedPage("preboot-inventory/ipmi_event.txt", page), page);
+    EXPECT_NE("", PageOf(writer.Calls(), "chassis_event"));
 }
 
 }  // namespace
