@@ -18,7 +18,7 @@ namespace {
 
 std::vector<std::string> KMCSample() {
     std::vector<std::string> files;
-    for (const auto& entry : fs::directory_iterator(std::string(BRAIGRION_SOURCE_DIR) + "/samples/kmc-server")) {
+    for (const auto& entry : fs::directory_iterator(std::string(BRAIGRION_SOURCE_DIR) + "/samples/kmc-blade")) {
         if (entry.path().extension() == ".xml") files.push_back(entry.path().string());
     }
     std::sort(files.begin(), files.end());

@@ -115,7 +115,7 @@ TEST_P(SamplePages, AreWrittenAsExpected) {
 // their documentation.
 INSTANTIATE_TEST_SUITE_P(Samples, SamplePages,
                          ::testing::Values("windows-server", "linux-teaming", "linux-server", "preboot", "multinode",
-                                           "kmc-server"),
+                                           "kmc-blade"),
                          [](const ::testing::TestParamInfo<const char*>& info) {
                              std::string name = info.param;
                              std::replace(name.begin(), name.end(), '-', '_');

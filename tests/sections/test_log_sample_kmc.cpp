@@ -1,7 +1,7 @@
 // The KMC sample machine written the way its service processor's logs are
 // read on a KMC system: with the KMC flag and in LUZ mode, where the IPMI
 // page carries the parser's output and the raw records, and the DCAP log
-// exists (tests/fixtures/pages/kmc-server-luz/); and the pre-boot sample's
+// exists (tests/fixtures/pages/kmc-blade-luz/); and the pre-boot sample's
 // system inventory of the same logs (tests/fixtures/pages/preboot-inventory/).
 #include <algorithm>
 #include <filesystem>
@@ -66,11 +66,11 @@ TEST(KMCSample, ServiceProcessorPagesInLuzMode) {
     context["mode"] = NORVTKR20::TCIMValue(std::string("luz"));
     context["KMC"] = NORVTKR20::TCIMValue(std::string("TRUE"));
     TGridRecorder writer("html");
-    TReport report(repository::LoadCollection(SampleFiles("kmc-server")).fNamespace, context, "out");
+    TReport report(repository::LoadCollection(SampleFiles("kmc-blade")).fNamespace, context, "out");
     report.Write(&writer, context);
     for (const char* link : {"ipmi_event", "SPINTlog_system"}) {
         const std::string page = PageOf(writer.Calls(), link);
-        const std::string file = std::string("kmc-server-luz/") + link + ".txt";
+        const std::string file = std::string("kmc-blade-luz/") + link + ".txt";
         EXPECT_EQ(testing::ExpectedPage(file, page), page) << file;
     }
     // The KMC road has no chassis event log page of its own.
@@ -82,7 +82,7 @@ TEST(KMCSample, IsRepairedBeforeItsPages) {
     TGridRecorder writer(TKR_REPORT_DEFINITION::TKR_WRITER_TYPE_INVENTORY);
     std::map<std::string, NORVTKR20::TCIMValue> context;
     context["pageID"] = NORVTKR20::TCIMValue(std::string("CriticalDetails"));
-    boost::shared_ptr<NORVTKR20::ICIMNamespace> ns = repository::LoadCollection(SampleFiles("kmc-server")).fNamespace;
+    boost::shared_ptr<NORVTKR20::ICIMNamespace> ns = repository::LoadCollection(SampleFiles("kmc-blade")).fNamespace;
     TReport report(ns, context, "out");
     report.GetPage(&writer, context);
     const std::string page = PageOf(writer.Calls(), "critical_details");
