@@ -22,6 +22,11 @@ struct TRunOptions {
     bool fVCX = false;
     std::string fLogFile;  // "" logs nowhere unless a level is given
     int fLogLevel = -1;    // -1: 0 with a log file, no log without one
+    // The log pages' lookup files and documentation servers; "" keeps the
+    // writer's default.
+    std::string fDataFolder;
+    std::string fDocServer;
+    std::string fHelpServer;
 };
 
 struct TInfoOptions {

@@ -89,6 +89,7 @@ int RunPage(const TPageOptions& options, std::ostream& out, std::ostream& err) {
     context["pageID"] = NORVTKR20::TCIMValue(options.fPageID);
     TReport report(loaded.fNamespace, context, scratch.Path());
     backends::TInventoryWriter writer;
+    ApplyLogLinkOptions(options.fRun, writer);
     std::string page = report.GetPage(&writer, context);
     if (page.empty()) {
         throw std::runtime_error("page " + options.fPageID + " has nothing to show for this collection in " +

@@ -56,6 +56,7 @@ int RunReport(const TReportOptions& options, std::ostream& out, std::ostream& er
         index = "index.html";
     }
 
+    ApplyLogLinkOptions(options.fRun, *writer);
     TContextMap context = MakeContext(options.fRun);
     TReport report(loaded.fNamespace, context, directory.WorkPath());
     {

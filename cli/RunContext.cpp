@@ -3,10 +3,28 @@
 #include <CLI/CLI.hpp>
 
 #include "CollectionLoader.h"
+#include "braigrion/TWriter.h"
 #include "tkrcore/TRootObject.h"
 
 namespace braigrion {
 namespace cli {
+
+namespace {
+
+// A documentation server is an absolute http or https address with a host.
+const CLI::Validator WebAddress(
+    [](std::string& value) -> std::string {
+        for (const char* scheme : {"http://", "https://"}) {
+            const std::string prefix(scheme);
+            if (value.compare(0, prefix.size(), prefix) == 0 && value.size() > prefix.size() &&
+                value[prefix.size()] != '/' && value.find_first_of(" \"'<>") == std::string::npos)
+                return std::string();
+        }
+        return "not an absolute http:// or https:// address: " + value;
+    },
+    "URL");
+
+}  // namespace
 
 void AddRunOptions(CLI::App& command, TRunOptions& options) {
     command.add_option("--mode", options.fMode, "Generation mode: default, or luz for the service pages")
@@ -18,6 +36,28 @@ void AddRunOptions(CLI::App& command, TRunOptions& options) {
     command.add_option("--log-level", options.fLogLevel, "Log lines up to this level: 0 errors ... 3 trace")
         ->check(CLI::Range(0, 3))
         ->type_name("N");
+    const TWriter::TLogLinkSettings defaults;
+    command.add_option("--data-dir", options.fDataFolder, "Folder of the log pages' lookup files (default " +
+                                                              defaults.fDataFolder + ", from the working directory)")
+        ->check(CLI::ExistingDirectory)
+        ->type_name("DIR");
+    command.add_option("--doc-server", options.fDocServer,
+                       "Documentation server of event and diagnostic links (default " + defaults.fDocServer + ")")
+        ->check(WebAddress)
+        ->type_name("URL");
+    command.add_option("--help-server", options.fHelpServer,
+                       "Internal help server of the one machine type it serves (default " + defaults.fHelpServer +
+                           ")")
+        ->check(WebAddress)
+        ->type_name("URL");
+}
+
+void ApplyLogLinkOptions(const TRunOptions& options, TWriter& writer) {
+    TWriter::TLogLinkSettings settings = writer.GetLogLinkSettings();
+    if (!options.fDataFolder.empty()) settings.fDataFolder = options.fDataFolder;
+    if (!options.fDocServer.empty()) settings.fDocServer = options.fDocServer;
+    if (!options.fHelpServer.empty()) settings.fHelpServer = options.fHelpServer;
+    writer.SetLogLinkSettings(settings);
 }
 
 TContextMap MakeContext(const TRunOptions& options) {

@@ -13,6 +13,10 @@ class App;
 }
 
 namespace braigrion {
+class TWriter;
+}
+
+namespace braigrion {
 namespace cli {
 
 typedef std::map<std::string, NORVTKR20::TCIMValue> TContextMap;
@@ -24,6 +28,10 @@ void AddRunOptions(CLI::App& command, TRunOptions& options);
 // only when --vcx is given ("TRUE"), because the report lets "VCX" overrule
 // "KMC" whenever both are present.
 TContextMap MakeContext(const TRunOptions& options);
+
+// Gives the writer the data folder and documentation servers of the log
+// pages that the options name; the others keep their defaults.
+void ApplyLogLinkOptions(const TRunOptions& options, TWriter& writer);
 
 // Points the core log at the file of --log, at the level of --log-level;
 // without a file, a level sends the log to standard error, and without

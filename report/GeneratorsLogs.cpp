@@ -19,7 +19,7 @@ const char kLuzMode[] = "luz";
 
 }  // namespace
 
-void TWriter::Generator_OSLogs(TBuilderPtr /*builder*/, std::string pageID) {
+void TWriter::Generator_OSLogs(TBuilderPtr builder, std::string pageID) {
     const std::string name = "TWriter::Generator_OSLogs";
     Trace(name + kEntering);
     if (fPreboot) {
@@ -28,9 +28,9 @@ void TWriter::Generator_OSLogs(TBuilderPtr /*builder*/, std::string pageID) {
         Trace(name + kDeltaDoNothing);
     } else if (fOSType == TReportParametersBuilder::kOSWindows ||
                fOSType == TReportParametersBuilder::kOSWindowsServer) {
-        NotYetGenerated(pageID);  // WriteWindowsEventReport(builder, pageID)
+        WriteWindowsEventReport(builder, pageID);
     } else if (fOSType == TReportParametersBuilder::kOSLinux || fOSType == TReportParametersBuilder::kOSVMwareESX) {
-        NotYetGenerated(pageID);  // WriteLinuxLogReport(builder, pageID)
+        WriteLinuxLogReport(builder, pageID);
     } else {
         Trace(name + " -- Unkown OS Type");
     }
@@ -39,28 +39,28 @@ void TWriter::Generator_OSLogs(TBuilderPtr /*builder*/, std::string pageID) {
 
 // The service processor's logs. The system inventory of pre-boot data
 // shows them in every mode, delta included.
-void TWriter::Generator_ServProcEvent(TBuilderPtr /*builder*/, std::string pageID) {
+void TWriter::Generator_ServProcEvent(TBuilderPtr builder, std::string pageID) {
     const std::string name = "TWriter::Generator_ServProcEvent";
     Trace(name + kEntering);
     if (fPreboot && fWriterType == TKR_REPORT_DEFINITION::TKR_WRITER_TYPE_INVENTORY) {
         Trace(name + " -- Under pTKR GUI System Inventory mode");
         if (!fKMC) {
-            NotYetGenerated(pageID);  // WriteGenericReport(builder->BuildDLMLogParams())
-            NotYetGenerated(pageID);  // WriteGenericReport(builder->BuildZEPHLogParams())
-            NotYetGenerated(pageID);  // WriteIPMIReport(builder->BuildIPMILogParams())
-            NotYetGenerated(pageID);  // WriteGenericReport(builder->BuildMergeLogParams())
+            WriteGenericReport(builder->BuildDLMLogParams());
+            WriteGenericReport(builder->BuildZEPHLogParams());
+            WriteIPMIReport(builder->BuildIPMILogParams());
+            WriteGenericReport(builder->BuildMergeLogParams());
         } else {
-            NotYetGenerated(pageID);  // WriteGenericReport(builder->BuildIPMILogKMCParams())
-            NotYetGenerated(pageID);  // WriteCustomChassisEventLog(builder, pageID)
+            WriteGenericReport(builder->BuildIPMILogKMCParams());
+            WriteCustomChassisEventLog(builder, pageID);
         }
     } else if (fProviderType == kDeltaProviderType) {
         Trace(name + kDeltaDoNothing);
     } else if (!fKMC) {
-        NotYetGenerated(pageID);  // WriteGenericReport(builder->BuildDLMLogParams())
-        NotYetGenerated(pageID);  // WriteGenericReport(builder->BuildZEPHLogParams())
-        NotYetGenerated(pageID);  // WriteCustomChassisEventLog(builder, pageID)
+        WriteGenericReport(builder->BuildDLMLogParams());
+        WriteGenericReport(builder->BuildZEPHLogParams());
+        WriteCustomChassisEventLog(builder, pageID);
     } else {
-        NotYetGenerated(pageID);  // WriteIPMIReport(builder->BuildIPMILogParams())
+        WriteIPMIReport(builder->BuildIPMILogParams());
     }
     Trace(name + kExiting);
 }
@@ -120,22 +120,22 @@ void TWriter::Generator_AMDAticonfigLog(TBuilderPtr /*builder*/, std::string pag
     Trace(name + kExiting);
 }
 
-void TWriter::Generator_SPINTLog(TBuilderPtr /*builder*/, std::string pageID) {
+void TWriter::Generator_SPINTLog(TBuilderPtr builder, std::string /*pageID*/) {
     const std::string name = "TWriter::Generator_SPINTLog";
     Trace(name + kEntering);
     if (fMode == kLuzMode) {
         if (fProviderType == kDeltaProviderType) {
             Trace(name + kDeltaDoNothing);
         } else {
-            NotYetGenerated(pageID);  // WriteGenericReport(builder->BuildSPINTParams())
+            WriteGenericReport(builder->BuildSPINTParams());
         }
     }
     Trace(name + kExiting);
 }
 
-void TWriter::Generator_MergedLog(TBuilderPtr /*builder*/, std::string pageID) {
+void TWriter::Generator_MergedLog(TBuilderPtr builder, std::string pageID) {
     WriteUnlessDelta("TWriter::Generator_MergedLog", fProviderType == kDeltaProviderType,
-                     [&] { NotYetGenerated(pageID); });  // WriteMergedLogReport(builder, pageID)
+                     [&] { WriteMergedLogReport(builder, pageID); });
 }
 
 // On a Red Hat system (builder->IsRedHat()) the page is left out with the
@@ -156,19 +156,19 @@ void TWriter::Generator_PatchBeacon(TBuilderPtr builder, std::string /*pageID*/)
                      [&] { WriteGenericReport(builder->BuildPBParams()); });
 }
 
-void TWriter::Generator_FileLoader(TBuilderPtr /*builder*/, std::string pageID) {
+void TWriter::Generator_FileLoader(TBuilderPtr builder, std::string /*pageID*/) {
     WriteUnlessDelta("TWriter::Generator_FileLoader", fProviderType == kDeltaProviderType,
-                     [&] { NotYetGenerated(pageID); });  // WriteGenericReport(builder->BuildFileLoaderParams())
+                     [&] { WriteGenericReport(builder->BuildFileLoaderParams()); });
 }
 
-void TWriter::Generator_DiagnosticLog(TBuilderPtr /*builder*/, std::string pageID) {
+void TWriter::Generator_DiagnosticLog(TBuilderPtr builder, std::string pageID) {
     WriteUnlessDelta("TWriter::Generator_DiagnosticLog", fProviderType == kDeltaProviderType,
-                     [&] { NotYetGenerated(pageID); });  // WriteCustomDiagnosticLog(builder, pageID)
+                     [&] { WriteCustomDiagnosticLog(builder, pageID); });
 }
 
-void TWriter::Generator_TKRErrorLog(TBuilderPtr /*builder*/, std::string pageID) {
+void TWriter::Generator_TKRErrorLog(TBuilderPtr builder, std::string /*pageID*/) {
     WriteUnlessDelta("TWriter::Generator_TKRErrorLog", fProviderType == kDeltaProviderType,
-                     [&] { NotYetGenerated(pageID); });  // WriteGenericReport(builder->BuildTKRLogParams())
+                     [&] { WriteGenericReport(builder->BuildTKRLogParams()); });
 }
 
 }  // namespace braigrion

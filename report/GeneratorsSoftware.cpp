@@ -34,14 +34,14 @@ void TWriter::Generator_SystemOverview(TBuilderPtr builder, std::string pageID) 
 }
 
 // The critical details exist for the inventory back-end only.
-void TWriter::Generator_CriticalDetails(TBuilderPtr /*builder*/, std::string pageID) {
+void TWriter::Generator_CriticalDetails(TBuilderPtr builder, std::string /*pageID*/) {
     const std::string name = "TWriter::Generator_CriticalDetails";
     Trace(name + kEntering);
     if (fWriterType == TKR_REPORT_DEFINITION::TKR_WRITER_TYPE_INVENTORY) {
         if (fProviderType == kDeltaProviderType) {
             Trace(name + kDeltaDoNothing);
         } else {
-            NotYetGenerated(pageID);  // WriteGenericReport(builder->BuildCriticalDetailsParams())
+            WriteGenericReport(builder->BuildCriticalDetailsParams());
         }
     }
     Trace(name + kExiting);

@@ -77,6 +77,22 @@ public:
     TReportParameters BuildBISTParams() const;
     TReportParameters BuildGlowTraceParams() const;
     TReportParameters BuildKMCLicenseKeyParams() const;
+    // Log pages. The IPMI page's name tells a BMC read over the LAN; in LUZ
+    // mode the IPMI pages add the parser's output and the raw records.
+    TReportParameters BuildTKRLogParams() const;
+    TReportParameters BuildMergeLogParams() const;
+    TReportParameters BuildWinSysEventParams() const;
+    TReportParameters BuildWinSecEventParams() const;
+    TReportParameters BuildWinAppEventParams() const;
+    TReportParameters BuildCELLogParams() const;
+    TReportParameters BuildZEPHLogParams() const;
+    TReportParameters BuildDLMLogParams() const;
+    TReportParameters BuildIPMILogParams() const;
+    TReportParameters BuildIPMILogKMCParams() const;
+    TReportParameters BuildCriticalDetailsParams() const;
+    TReportParameters BuildDiagsParams() const;
+    TReportParameters BuildSPINTParams() const;
+    TReportParameters BuildFileLoaderParams() const;
 
 private:
     // The operating system as read from the one instance of the OS class;

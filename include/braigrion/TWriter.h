@@ -165,6 +165,51 @@ public:
 
     // --- Log sections (sections/Log*.cpp): event and diagnostic logs, operating system logs ---
 
+    // Where the log pages find their lookup files, and the two servers
+    // their documentation links point at. The caller sets them before a
+    // report; without that the defaults below hold.
+    struct TLogLinkSettings {
+        TLogLinkSettings();
+        std::string fDataFolder;  // holds the lookup files; "./data"
+        std::string fDocServer;   // public documentation server, an absolute http(s) address
+        std::string fHelpServer;  // internal help server of one machine type, on port 8040
+    };
+    void SetLogLinkSettings(const TLogLinkSettings& settings) { fLogLinks = settings; }
+    const TLogLinkSettings& GetLogLinkSettings() const { return fLogLinks; }
+
+    // The chassis event log, each event linked to its documentation page
+    // when the documentation covers this machine type.
+    void WriteCustomChassisEventLog(TBuilderPtr builder, std::string pageID);
+    // The diagnostics that ran, with links to their codes' pages.
+    void WriteCustomDiagnosticLog(TBuilderPtr builder, std::string reportName);
+    // The IPMI page, with a link in its title when a multi-tool left one.
+    void WriteIPMIReport(TReportParameters params);
+    void WriteIPMIEventReportWithLink(TReportParameters params, std::string link);
+    // The operating system's logs: Windows event logs, one page per Linux
+    // log file, the merged log.
+    void WriteWindowsEventReport(TBuilderPtr builder, std::string pageID);
+    void WriteLinuxLogReport(TBuilderPtr builder, std::string pageID);
+    void WriteMergedLogReport(TBuilderPtr builder, std::string pageID);
+
+    // The four-character machine type inside "-[...]" of the product name;
+    // "" when there is none.
+    std::string GetMTFromRepository();
+    // Whether the IPMI records carry a multi-tool's "Action"; `out` takes
+    // the text of the last record read.
+    bool IsMultitool(std::string& out);
+    // "0X 8000-0123" becomes "80000123".
+    void ProcessKMCEventID(std::string& id);
+    // The code between a leading "[" and the first "]"; "" otherwise.
+    std::string ProcessUefiDiagCodeFromAD(std::string text);
+    // A diagnostic code is the first 11 characters of the record text.
+    void ProcessDiagnosticErrorCode(std::string& text);
+    // Cuts "left_desc_right" at its first "_desc_".
+    void ExtractLink(const std::string& line, std::string& left, std::string& right);
+
+private:
+    TLogLinkSettings fLogLinks;
+
+public:
     // (end of block)
 
     // --- Storage sections (sections/LSI*.cpp, Halcyon*.cpp, PMC*.cpp, DriveHealth*.cpp) ---

@@ -120,7 +120,8 @@ TEST(Dispatch, AFailingPageIsContainedAndTheNextPageRuns) {
     EXPECT_NE(std::string::npos,
               transcript.find("WriteIndexEntry(\"pci_info\", \"PCI Information\", true)\nOpenPage(\"out/servproc_config\")\n"));
     EXPECT_EQ(std::string::npos, transcript.find("page Firmware\n"));
-    EXPECT_NE(std::string::npos, transcript.find("page TKRLog\nEndReport()\n"));
+    EXPECT_NE(std::string::npos,
+              transcript.find("WriteIndexEntry(\"tkr_log\", \"TKR Error Log\", false)\nEndReport()\n"));
 }
 
 }  // namespace

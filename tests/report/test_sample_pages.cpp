@@ -55,26 +55,37 @@ std::map<std::string, std::string> WritePages(const std::string& sample) {
     }
     std::sort(files.begin(), files.end());
     TPageRecorder writer("html");
+    // The example lookup files, so that documentation links show.
+    TWriter::TLogLinkSettings links;
+    links.fDataFolder = std::string(BRAIGRION_SOURCE_DIR) + "/data";
+    writer.SetLogLinkSettings(links);
     // A KMC machine and a chassis inventory are read as the command's --kmc
     // and --vcx read them.
     std::map<std::string, NORVTKR20::TCIMValue> context;
-    if (StartsWith(sample, "kmc")) context["KMC"] = NORVTKR20::TCIMValue(std::string("TRUE"));
+    if (sample == "kmc-server") context["KMC"] = NORVTKR20::TCIMValue(std::string("TRUE"));
     if (StartsWith(sample, "vcx")) context["VCX"] = NORVTKR20::TCIMValue(std::string("TRUE"));
     TReport report(repository::LoadCollection(files).fNamespace, context, "out");
     report.Write(&writer, context);
 
     std::map<std::string, std::string> pages;
     std::string link, page;
+    // A page whose index line comes before it (the Linux log pages) starts
+    // with that line and ends where it closes.
+    std::string indexFirst;
     for (const std::string& call : writer.Calls()) {
         if (StartsWith(call, "EscapeText(") || StartsWith(call, "GetSeparatorText(")) continue;
+        if (link.empty() && StartsWith(call, "WriteIndexEntry(")) indexFirst = call;
         if (StartsWith(call, "OpenPage(")) {
             link = call.substr(call.find_last_of('/') + 1);
             link = link.substr(0, link.find('"'));
             page.clear();
+            if (StartsWith(indexFirst, "WriteIndexEntry(\"" + link + "\"")) page = indexFirst + "\n";
+            indexFirst.clear();
         }
         if (link.empty()) continue;
         page += call + "\n";
-        if (StartsWith(call, "WriteIndexEntry(")) {
+        const bool indexed = page.compare(0, 16, "WriteIndexEntry(") == 0;
+        if (indexed ? StartsWith(call, "ClosePage(") : StartsWith(call, "WriteIndexEntry(")) {
             EXPECT_EQ(0u, pages.count(link)) << "two pages with the link " << link;
             pages[link] = page;
             link.clear();
@@ -105,10 +116,12 @@ TEST_P(SamplePages, AreWrittenAsExpected) {
 // packages, modules and configuration files; pre-boot data no operating
 // system pages but the configuration files; a multi-node system has its
 // nodes in a table of their own; a KMC machine has the KMC forms of the
-// service processor pages, and a chassis inventory its VCX page.
+// service processor pages, and a chassis inventory its VCX page; the KMC
+// blade, written without the KMC flag, has its service processor's logs and
+// its diagnostics linked to their documentation.
 INSTANTIATE_TEST_SUITE_P(Samples, SamplePages,
                          ::testing::Values("windows-server", "linux-teaming", "linux-server", "preboot", "multinode",
-                                           "kmc-server", "vcx-chassis"),
+                                           "kmc-server", "vcx-chassis", "kmc-blade"),
                          [](const ::testing::TestParamInfo<const char*>& info) {
                              std::string name = info.param;
                              std::replace(name.begin(), name.end(), '-', '_');
