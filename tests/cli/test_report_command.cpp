@@ -177,6 +177,72 @@ TEST_F(ReportCommand, RefusesWithOneLineAndTheRightStatus) {
     EXPECT_EQ(earlierIndex, Slurp(Path("earlier/index.html")));
 }
 
+// Every long number in a table cell of a sample's HTML report (a token of
+// digits, perhaps with ". , : -", of 6 to 40 characters) stands whole in
+// the same sample's text report: the text back-end widens a column, or
+// makes a line longer, rather than cut a token.
+TEST_F(ReportCommand, TheTextReportHoldsEveryLongNumberOfTheHtmlReportWhole) {
+    // The texts of an HTML page's table cells, tags made blanks.
+    auto cellTexts = [](const std::string& html) {
+        std::vector<std::string> cells;
+        for (size_t at = html.find("<t"); at != std::string::npos; at = html.find("<t", at + 1)) {
+            if (at + 3 >= html.size() || (html[at + 2] != 'd' && html[at + 2] != 'h')) continue;
+            const size_t open = html.find('>', at);
+            const size_t close = html.find("</t", open);
+            if (open == std::string::npos || close == std::string::npos) break;
+            std::string text;
+            bool inTag = false;
+            for (size_t i = open + 1; i < close; ++i) {
+                if (html[i] == '<') inTag = true;
+                text += inTag ? ' ' : html[i];
+                if (html[i] == '>') inTag = false;
+            }
+            cells.push_back(text);
+            at = close;
+        }
+        return cells;
+    };
+    auto isNumber = [](const std::string& token) {
+        if (token.size() < 6 || token.size() > 40 || !std::isdigit(static_cast<unsigned char>(token[0]))) return false;
+        size_t digits = 0;
+        for (char c : token) {
+            if (std::isdigit(static_cast<unsigned char>(c))) {
+                ++digits;
+            } else if (std::string(".,:-").find(c) == std::string::npos) {
+                return false;
+            }
+        }
+        return digits >= 6;
+    };
+    size_t checked = 0;
+    for (const auto& sample : fs::directory_iterator(std::string(BRAIGRION_SOURCE_DIR) + "/samples")) {
+        if (!sample.is_directory()) continue;
+        const std::string name = sample.path().filename().string();
+        SCOPED_TRACE(name);
+        std::vector<std::string> files;
+        for (const auto& file : fs::directory_iterator(sample.path()))
+            if (file.path().extension() == ".xml") files.push_back(file.path().string());
+        std::sort(files.begin(), files.end());
+        ASSERT_EQ(0, RunBraigrion(Args({"report", "-q", "-o", Path(name + "-html")}, files)).fStatus);
+        ASSERT_EQ(0, RunBraigrion(Args({"report", "-q", "--format", "text", "-o", Path(name + "-text")}, files)).fStatus);
+
+        std::string text;
+        for (const auto& page : fs::directory_iterator(Path(name + "-text"))) text += Slurp(page.path().string());
+        for (const auto& page : fs::directory_iterator(Path(name + "-html"))) {
+            if (page.path().extension() != ".html") continue;
+            for (const std::string& cell : cellTexts(Slurp(page.path().string()))) {
+                std::istringstream tokens(cell);
+                for (std::string token; tokens >> token;) {
+                    if (!isNumber(token)) continue;
+                    ++checked;
+                    EXPECT_NE(std::string::npos, text.find(token)) << token << " of " << page.path().filename();
+                }
+            }
+        }
+    }
+    EXPECT_GT(checked, 100u) << "the samples hold long numbers";
+}
+
 // One page on standard output, as an inventory page: its title, its tables
 // with the collection's values, and nothing written anywhere else.
 TEST_F(ReportCommand, PagePrintsOnePageOfTheCollection) {
