@@ -63,6 +63,11 @@ void TBackendWriter::WriteCategory(const std::string& categoryName) {
 
 void TBackendWriter::EndReport() {
     if (fPageOpen) ClosePage();
+    // A heading with no page under it (its pages not written, or not in
+    // this version) is left out of the index.
+    fIndex.erase(std::remove_if(fIndex.begin(), fIndex.end(),
+                                [](const TCategory& category) { return category.fEntries.empty(); }),
+                 fIndex.end());
     WriteReportFiles();
 }
 

@@ -1,5 +1,8 @@
 #include "THtmlWriter.h"
 
+#include <cctype>
+#include <cstring>
+
 #include "Assets.h"
 #include "HtmlText.h"
 #include "braigrion/ReportDefinition.h"
@@ -17,6 +20,60 @@ std::string Percent(int width) {
 
 bool IsSwitchText(const std::string& text) {
     return text.compare(0, 4, " - [") == 0;
+}
+
+// Tokens of up to this many characters are kept on one line.
+const size_t kWholeToken = 40;
+
+// Whether a browser may break a line inside `token` (finished HTML text,
+// no tag), and the token is short enough to be kept whole: it holds a
+// character after which lines break, such as the hyphen of a date
+// (2021-04-08) or a version (4.620.00-5164) or a path's slash.
+bool BreaksInside(const std::string& token) {
+    size_t characters = 0;
+    bool breaks = false;
+    for (size_t i = 0; i < token.size(); ++i) {
+        const unsigned char c = static_cast<unsigned char>(token[i]);
+        if (c == '&') {
+            const size_t end = token.find(';', i);
+            if (end != std::string::npos) i = end;
+        } else if ((c & 0xC0) == 0x80) {
+            continue;  // inside a character
+        } else if (std::strchr("-/\\?!)]}%+|", c) != nullptr && c != '\0' && i + 1 < token.size()) {
+            breaks = true;  // a line may break after these, when more follows
+        }
+        ++characters;
+    }
+    return breaks && characters <= kWholeToken;
+}
+
+// Cell mark-up with each token (a run of characters between blanks, outside
+// the tags) that a browser could break inside held together: a cell then
+// wraps between words only, whatever the browser's line breaking allows
+// after a hyphen or a slash. The text itself is unchanged.
+std::string KeepTokensWhole(const std::string& html) {
+    std::string out;
+    out.reserve(html.size());
+    size_t i = 0;
+    while (i < html.size()) {
+        const char c = html[i];
+        if (c == '<') {
+            const size_t end = html.find('>', i);
+            const size_t stop = end == std::string::npos ? html.size() : end + 1;
+            out.append(html, i, stop - i);
+            i = stop;
+        } else if (std::isspace(static_cast<unsigned char>(c))) {
+            out += c;
+            ++i;
+        } else {
+            size_t j = i;
+            while (j < html.size() && html[j] != '<' && !std::isspace(static_cast<unsigned char>(html[j]))) ++j;
+            const std::string token = html.substr(i, j - i);
+            out += BreaksInside(token) ? "<span class=\"nw\">" + token + "</span>" : token;
+            i = j;
+        }
+    }
+    return out;
 }
 
 }  // namespace
@@ -98,7 +155,7 @@ void THtmlWriter::WriteTableGrid(TTable& table) {
            std::to_string(fTableCounter) + kTableHeaderEnd;
 
     auto cellText = [](const TTable::TCell& cell) {
-        return cell.flags[kFinalText] ? cell.text : SanitizeCellMarkup(cell.text);
+        return KeepTokensWhole(cell.flags[kFinalText] ? cell.text : SanitizeCellMarkup(cell.text));
     };
     int firstBodyRow = 0;
     if (table.fColumnHeaders) {

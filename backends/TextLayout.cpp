@@ -8,6 +8,8 @@ namespace backends {
 namespace {
 
 const std::string kGap = "  ";
+// Tokens up to this many characters are never cut: their column is widened.
+const size_t kWholeToken = 40;
 
 bool IsContinuation(char c) {
     return (static_cast<unsigned char>(c) & 0xC0) == 0x80;
@@ -42,6 +44,22 @@ size_t LongestLine(const std::string& text) {
     return longest;
 }
 
+// The longest token (a run of characters between blanks and line feeds) of
+// at most `limit` characters; longer tokens are cut anyway.
+size_t LongestTokenUpTo(const std::string& text, size_t limit) {
+    size_t longest = 0;
+    size_t current = 0;
+    for (size_t i = 0; i <= text.size(); ++i) {
+        if (i == text.size() || text[i] == ' ' || text[i] == '\n') {
+            if (current <= limit) longest = std::max(longest, current);
+            current = 0;
+        } else if (!IsContinuation(text[i])) {
+            ++current;
+        }
+    }
+    return longest;
+}
+
 std::string Padded(const std::string& text, size_t width) {
     size_t w = TextWidth(text);
     return w >= width ? text : text + std::string(width - w, ' ');
@@ -58,14 +76,19 @@ bool IsHeaderCell(const TTable& table, int r, int c) {
 
 // Widths of the columns: the percentages shared out over `available`, then
 // cut to what the content needs, the room saved going to columns that need
-// more.
+// more. Last, every column is made wide enough for its longest token of up
+// to kWholeToken characters: first with room from columns that can spare
+// it without cutting a token of their own, then by making the line longer.
 std::vector<size_t> ColumnWidths(const TTable& table, size_t available) {
     size_t cols = static_cast<size_t>(table.fCols);
     std::vector<size_t> natural(cols, 1);
+    std::vector<size_t> least(cols, 1);
     for (int r = 0; r < table.fRows; ++r) {
         if (table.Cell(r, 0).flags[0]) continue;
         for (size_t c = 0; c < cols; ++c) {
-            natural[c] = std::max(natural[c], LongestLine(table.Cell(r, static_cast<int>(c)).text));
+            const std::string& text = table.Cell(r, static_cast<int>(c)).text;
+            natural[c] = std::max(natural[c], LongestLine(text));
+            least[c] = std::max(least[c], LongestTokenUpTo(text, kWholeToken));
         }
     }
     std::vector<double> share(cols, 0);
@@ -99,6 +122,17 @@ std::vector<size_t> ColumnWidths(const TTable& table, size_t available) {
             }
         }
         if (!grew) break;
+    }
+    for (size_t c = 0; c < cols; ++c) {
+        while (width[c] < least[c]) {
+            size_t donor = cols;
+            for (size_t d = 0; d < cols; ++d) {
+                if (d == c || width[d] <= std::max<size_t>(least[d], 4)) continue;
+                if (donor == cols || width[d] - least[d] > width[donor] - least[donor]) donor = d;
+            }
+            if (donor != cols) --width[donor];
+            ++width[c];
+        }
     }
     return width;
 }

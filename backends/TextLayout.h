@@ -21,7 +21,10 @@ std::vector<std::string> WrapText(const std::string& text, size_t width);
 // The grid as aligned columns within `lineWidth` characters for a table
 // of width 100%. Column widths follow the table's percentages as upper
 // bounds, a narrower content gives its room to the columns that need it, and
-// longer values wrap inside their column. Header rows are underlined; a cell
+// longer values wrap inside their column, at blanks. A column is never
+// narrower than its longest token of up to 40 characters (a number, a
+// version, an address, a word): it takes room from the other columns, or
+// the line grows longer than `lineWidth`; only a longer token is cut. Header rows are underlined; a cell
 // flagged to span the row (flag 0) is printed across it.
 std::string RenderTextGrid(const TTable& table, size_t lineWidth);
 

@@ -56,7 +56,9 @@ CLI::App* AddPageCommand(CLI::App& app, TPageOptions& options);
 // system and its classes with their instance counts.
 int RunInfo(const TInfoOptions& options, std::ostream& out, std::ostream& err);
 // Writes the report of a collection into a directory and prints the path of
-// its index. Progress goes to `err` when `progressToErr`.
+// its index. Progress goes to `err` when `progressToErr`; a one-line summary
+// (pages written, pages without data, page ids not available in this
+// version) goes to `err` in any case.
 int RunReport(const TReportOptions& options, std::ostream& out, std::ostream& err, bool progressToErr);
 // Prints one page through the inventory back-end.
 int RunPage(const TPageOptions& options, std::ostream& out, std::ostream& err);

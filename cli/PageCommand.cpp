@@ -1,6 +1,7 @@
 // braigrion page: one page through the inventory back-end, on standard output.
 #include <CLI/CLI.hpp>
 
+#include <algorithm>
 #include <filesystem>
 #include <ostream>
 #include <stdexcept>
@@ -91,6 +92,10 @@ int RunPage(const TPageOptions& options, std::ostream& out, std::ostream& err) {
     backends::TInventoryWriter writer;
     ApplyLogLinkOptions(options.fRun, writer);
     std::string page = report.GetPage(&writer, context);
+    const std::vector<std::string>& unavailable = writer.GetUnavailablePages();
+    if (page.empty() && std::find(unavailable.begin(), unavailable.end(), options.fPageID) != unavailable.end()) {
+        throw std::runtime_error("page " + options.fPageID + " is not available in this version");
+    }
     if (page.empty()) {
         throw std::runtime_error("page " + options.fPageID + " has nothing to show for this collection in " +
                                  options.fRun.fMode + " mode");

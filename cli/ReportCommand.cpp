@@ -4,6 +4,7 @@
 #include <memory>
 #include <ostream>
 #include <stdexcept>
+#include <string>
 
 #include "CollectionLoader.h"
 #include "Commands.h"
@@ -16,6 +17,27 @@
 
 namespace braigrion {
 namespace cli {
+
+namespace {
+
+// The run's last line: the pages the index lists, those of them without
+// data, and the page ids that this version cannot write yet.
+std::string Summary(const backends::TBackendWriter& writer) {
+    size_t written = 0;
+    size_t withoutData = 0;
+    for (const backends::TBackendWriter::TCategory& category : writer.GetIndex()) {
+        for (const backends::TBackendWriter::TIndexEntry& entry : category.fEntries) {
+            ++written;
+            withoutData += entry.fHasData ? 0 : 1;
+        }
+    }
+    std::string missing;
+    for (const std::string& page : writer.GetUnavailablePages()) missing += (missing.empty() ? "" : " ") + page;
+    return "braigrion: " + std::to_string(written) + " pages written, " + std::to_string(withoutData) +
+           " without data; not available in this version: " + (missing.empty() ? "none" : missing);
+}
+
+}  // namespace
 
 CLI::App* AddReportCommand(CLI::App& app, TReportOptions& options) {
     CLI::App* command = app.add_subcommand("report", "Write the report of a collection into a directory");
@@ -69,6 +91,7 @@ int RunReport(const TReportOptions& options, std::ostream& out, std::ostream& er
     if (!writer->GetFailure().empty()) throw std::runtime_error(writer->GetFailure());
 
     directory.Commit(options.fFormat);
+    err << Summary(*writer) << '\n';
     out << directory.TargetPath() << "/" << index << '\n';
     return 0;
 }

@@ -124,6 +124,10 @@ int TInstanceSorter::PropertyCompare(const std::string& a, const std::string& b,
     std::vector<TToken> tb;
     PropertySplit(a, ta, lower);
     PropertySplit(b, tb, lower);
+    return CompareTokens(ta, tb);
+}
+
+int TInstanceSorter::CompareTokens(const std::vector<TToken>& ta, const std::vector<TToken>& tb) {
     if (ta.empty() || tb.empty()) return CountDifference(ta.size(), tb.size());
 
     for (size_t i = 0; i < ta.size() && i < tb.size(); ++i) {
@@ -132,6 +136,8 @@ int TInstanceSorter::PropertyCompare(const std::string& a, const std::string& b,
         if (x.first != y.first) return x.first == kTextToken ? 1 : -1;  // numbers before text
         if (x.first == kNumberToken) {
             if (x.second.number != y.second.number) {
+                // The difference taken as a signed number: two numbers more
+                // than 2^63 apart compare the other way round.
                 std::int64_t diff = static_cast<std::int64_t>(x.second.number - y.second.number);
                 return diff < 1 ? -1 : 1;
             }

@@ -44,5 +44,26 @@ void WriteOrCompare(const std::string& name, bool delta, TWrite write, TCompare 
     Trace(name + kExiting);
 }
 
+// How a page with a raw-data page beside it (in LUZ mode) asks for it: it
+// says that it writes the raw data first, runs `writeRaw` (a raw-data
+// writer, named `rawWriter`) inside a guard of its own, and says when that
+// gave no page. The result is the raw page's link name, "" when there is
+// none: the caller then writes its page without the switch. Whatever the
+// raw page throws (a back-end failure, a result file that cannot be
+// written) stops here, so the caller's own page is still written.
+template <typename TWriteRaw>
+std::string WriteRawDataFirst(const std::string& caller, const std::string& rawWriter, TWriteRaw writeRaw) {
+    Trace(caller + " -- Under LUZ mode, write RawData first");
+    std::string link;
+    try {
+        link = writeRaw();
+    } catch (...) {
+        Trace(caller + " -- Exception was thrown from " + rawWriter);
+        link.clear();
+    }
+    if (link.empty()) Trace(caller + " -- " + rawWriter + " failed, write the page without RawData");
+    return link;
+}
+
 }  // namespace generators
 }  // namespace braigrion

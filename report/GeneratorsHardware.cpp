@@ -33,7 +33,9 @@ void TWriter::Generator_PCIInformation(TBuilderPtr builder, std::string pageID) 
             if (withRawData) {
                 // The raw page is written and closed first; without one the
                 // link is "" and the PCI page has no switch.
-                const std::string link = WritePCIRawDataReport(params.GetLinkName());
+                const std::string link =
+                    WriteRawDataFirst("TWriter::Generator_PCIInformation", "TWriter::WritePCIRawDataReport",
+                                      [&] { return WritePCIRawDataReport(params.GetLinkName()); });
                 WriteGenericReportWithLink(params, link);
             } else {
                 WriteGenericReport(params);

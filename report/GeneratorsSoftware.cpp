@@ -137,7 +137,9 @@ void TWriter::Generator_OSConfiguration(TBuilderPtr builder, std::string pageID)
             WriteGenericReport(builder->BuildOSConfigParams());
         }
     }
-    if (fOSType == TReportParametersBuilder::kOSLinux) {
+    // Linux here, as everywhere an OS type decides, is 2 or 3: a VMware ESX
+    // service console is a Linux system with the same configuration files.
+    if (fOSType == TReportParametersBuilder::kOSLinux || fOSType == TReportParametersBuilder::kOSVMwareESX) {
         Trace(name + " -- Under Linux, write Linux Config Files");
         if (delta) {
             Trace(name + kDeltaDoComparison);

@@ -1,10 +1,12 @@
 // The raw-data pages of the adapter sections: Fusion-io, Emulex and QLogic.
 //
 // The Fusion-io collector names each result file by its command. That name
-// is collected text, so it is used as a file name only when it is a plain
-// name inside the report's directory; any other command is written under a
-// numbered name, and the row links to the file actually written.
+// is collected text, so it is used as a file name only when it is a safe
+// name inside the report's directory (IsSafeFileName) that no earlier row
+// took; any other command is written under a numbered name, and the row
+// links to the file actually written.
 #include <algorithm>
+#include <set>
 
 #include "RawDataSupport.h"
 #include "braigrion/TWriter.h"
@@ -26,26 +28,27 @@ std::string TWriter::WriteFIORawDataReport(std::string linkName) {
     OpenRawPage(*this, fOutputPath, link, "FIO Raw Data Information", linkName);
     WriteTableBreak();
     try {
+        WriteTableTitle(kCommandsIssued, false, false);
         TTable table = CommandsTable(instances.size(), "Command", "Raw Result");
-        // A command that cannot be read leaves the row with the command and
-        // file of the row before; the first row then has a numbered file.
+        // A command that cannot be read leaves the row with the command of
+        // the row before; as that name is taken, its result gets a numbered
+        // file, so no result overwrites another.
         std::string command;
-        std::string fileName;
+        std::set<std::string> used;
         for (size_t index = 0; index < instances.size(); ++index) {
             try {
                 command = ValueOf(instances[index], "Command").ToString(10);
-                fileName = ResultFileName(command, NumberedFileName("FIO_RawData_Results_", static_cast<int>(index)));
             } catch (...) {
                 Trace(name + " -- Exception when getting the command");
-                if (fileName.empty()) fileName = NumberedFileName("FIO_RawData_Results_", static_cast<int>(index));
             }
+            const std::string fileName =
+                ResultFileName(command, NumberedFileName("FIO_RawData_Results_", static_cast<int>(index)), used);
             const int row = static_cast<int>(index) + 1;
             table.Cell(row, 0).text = CommandCell(*this, command);
             table.Cell(row, 1).text = ResultLinkCell(fileName);
             TResultFile file(fOutputPath + TOSSpecific::kFileSeparator + fileName);
             file.WriteLine(static_cast<std::string>(ValueOf(instances[index], "CommandResult")));
         }
-        WriteTableTitle(kCommandsIssued, false, false);
         WriteTableGrid(table);
     } catch (...) {
         Trace(name + " -- Exception when writing FIO raw data table ");
@@ -65,6 +68,7 @@ std::string TWriter::WriteEmulexRawDataReport(std::string linkName) {
 
     const std::string link = "emulex_rawData";
     OpenRawPage(*this, fOutputPath, link, "Emulex Raw Data Information", linkName);
+    WriteTableTitle("EmulexCNA Raw Data", false, false);
     TTable table = CommandsTable(instances.size(), "Command", "Raw Result");
     for (size_t index = 0; index < instances.size(); ++index) {
         // The row is labelled by the adapter's command, its colons made dashes.
@@ -88,7 +92,6 @@ std::string TWriter::WriteEmulexRawDataReport(std::string linkName) {
         }
         file.WriteLine(result);
     }
-    WriteTableTitle("EmulexCNA Raw Data", false, false);
     WriteTableGrid(table);
     WritePageFooter();
     ClosePage();
@@ -119,9 +122,9 @@ std::string TWriter::WriteQLogicRawDataReport(std::string linkName) {
         if (entry.first->empty()) continue;
         if (!opened) OpenRawPage(*this, fOutputPath, link, "QLogic Raw Data Information", linkName);
         opened = true;
+        WriteTableTitle(kCommandsIssued, false, false);
         TTable table = FillCommandsTable(*this, fOutputPath, *entry.first,
                                          {"Command", "Raw Result", entry.second, "Command", "RawResults"});
-        WriteTableTitle(kCommandsIssued, false, false);
         WriteTableGrid(table);
     }
     WritePageFooter();

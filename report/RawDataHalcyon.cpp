@@ -43,9 +43,9 @@ std::string WriteHalcyonPage(TWriter& writer, const TWriter::TNamespacePtr& ns, 
     }
 
     OpenRawPage(writer, outputPath, page.link, page.title, standardLink);
+    writer.WriteTableTitle(kCommandsIssued, false, false);
     TTable table = FillCommandsTable(writer, outputPath, instances,
                                      {"Command", "Result", page.filePrefix, "Command", "RawResults"});
-    writer.WriteTableTitle(kCommandsIssued, false, false);
     writer.WriteTableGrid(table);
     writer.WritePageFooter();
     writer.ClosePage();

@@ -157,6 +157,7 @@ std::string TWriter::WriteLSIRawDataReport(std::string& linkName) {
     };
 
     writeTable(utility, "LSI", [&] {
+        WriteTableTitle(kCommandsIssued, false, false);
         TTable table = CommandsTable(utility.size(), "Command", "Raw Result");
         for (size_t index = 0; index < utility.size(); ++index) {
             const std::string fileName = NumberedFileName("LSI_RawData_Rresults_", static_cast<int>(index));
@@ -166,10 +167,10 @@ std::string TWriter::WriteLSIRawDataReport(std::string& linkName) {
             TResultFile file(fOutputPath + TOSSpecific::kFileSeparator + fileName);
             file.WriteLine(UtilityResult(utility[index]));
         }
-        WriteTableTitle(kCommandsIssued, false, false);
         WriteTableGrid(table);
     });
     writeTable(mega, "LSI MR", [&] {
+        WriteTableTitle(kCommandsIssued, false, false);
         TTable table = CommandsTable(mega.size(), "Command", "Raw Result");
         for (size_t index = 0; index < mega.size(); ++index) {
             const std::string fileName = NumberedFileName("MegaLSI_RawData_Rresults_", static_cast<int>(index));
@@ -179,13 +180,12 @@ std::string TWriter::WriteLSIRawDataReport(std::string& linkName) {
             TResultFile file(fOutputPath + TOSSpecific::kFileSeparator + fileName);
             for (const std::string& line : ResultLines(ValueOf(mega[index], "RawResults"))) file.WriteLine(line);
         }
-        WriteTableTitle(kCommandsIssued, false, false);
         WriteTableGrid(table);
     });
     writeTable(ir, "LSI IR", [&] {
+        WriteTableTitle(kCommandsIssued, false, false);
         TTable table = FillCommandsTable(*this, fOutputPath, ir,
                                          {"Command", "Result", "LSI_RawData_Results_", "Command", "RawResults"});
-        WriteTableTitle(kCommandsIssued, false, false);
         WriteTableGrid(table);
     });
 

@@ -36,6 +36,7 @@ std::string TWriter::WritePCIRawDataReport(std::string linkName) {
     OpenRawPage(*this, fOutputPath, kLink, kTitle, linkName);
     bool anyRow = false;
     try {
+        WriteTableTitle(kCommandsIssued, false, false);
         TTable table = CommandsTable(instances.size(), "Command", "Raw Data");
         for (size_t index = 0; index < instances.size(); ++index) {
             const TInstancePtr& instance = instances[index];
@@ -72,7 +73,6 @@ std::string TWriter::WritePCIRawDataReport(std::string linkName) {
                 Trace(std::string(kName) + " - Exception caught when get property \"Command\"");
             }
         }
-        WriteTableTitle(kCommandsIssued, false, false);
         WriteTableGrid(table);
     } catch (...) {
         Trace(std::string(kName) + " - Exception cautht.");

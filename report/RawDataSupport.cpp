@@ -28,7 +28,7 @@ namespace {
 const int kTableWidth = 75;
 const int kCommandWidth = 80;
 const int kResultWidth = 20;
-const size_t kMaxFileName = 128;
+const size_t kMaxFileName = 255;
 
 bool EndsWithNoCase(const std::string& text, const std::string& suffix) {
     if (text.size() < suffix.size()) return false;
@@ -82,14 +82,9 @@ std::string NumberedFileName(const std::string& prefix, int index) {
     return prefix + std::to_string(index) + ".txt";
 }
 
-bool IsPlainFileName(const std::string& name) {
-    if (name.empty() || name.size() > kMaxFileName) return false;
-    if (name.front() == '.' || name.front() == ' ' || name.back() == ' ') return false;
-    for (unsigned char c : name) {
-        const bool plain = (c < 0x80 && std::isalnum(c)) || c == ' ' || c == '.' || c == '_' || c == '-' ||
-                           c == '+' || c == '=' || c == ',' || c == '@';
-        if (!plain) return false;
-    }
+bool IsSafeFileName(const std::string& name) {
+    if (name.empty() || name.size() > kMaxFileName || name == "." || name == "..") return false;
+    if (name.find('/') != std::string::npos || name.find('\0') != std::string::npos) return false;
     // The report's own pages and files are of these kinds; a result must
     // not take the place of one of them.
     for (const char* kind : {".html", ".htm", ".css", ".js"}) {
@@ -98,8 +93,12 @@ bool IsPlainFileName(const std::string& name) {
     return true;
 }
 
-std::string ResultFileName(const std::string& name, const std::string& fallback) {
-    return IsPlainFileName(name) ? name : fallback;
+std::string ResultFileName(const std::string& name, const std::string& fallback, std::set<std::string>& used) {
+    std::string chosen = IsSafeFileName(name) && used.count(name) == 0 ? name : fallback;
+    // A command may itself read like a numbered name taken before.
+    while (used.count(chosen) != 0) chosen = "_" + chosen;
+    used.insert(chosen);
+    return chosen;
 }
 
 TResultFile::TResultFile(const std::string& path) {
@@ -135,7 +134,18 @@ std::string CommandCell(TWriter& writer, const std::string& command, const std::
 }
 
 std::string ResultLinkCell(const std::string& fileName, const std::string& opening) {
-    return opening + fileName + kResultLinkClose;
+    static const char kHex[] = "0123456789ABCDEF";
+    std::string link;
+    for (unsigned char c : fileName) {
+        if ((c < 0x80 && std::isalnum(c)) || c == '-' || c == '.' || c == '_' || c == '~') {
+            link += static_cast<char>(c);
+        } else {
+            link += '%';
+            link += kHex[c >> 4];
+            link += kHex[c & 0x0F];
+        }
+    }
+    return opening + link + kResultLinkClose;
 }
 
 TTable FillCommandsTable(TWriter& writer, const std::string& outputPath, const TInstances& instances,

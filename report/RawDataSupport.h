@@ -9,6 +9,7 @@
 #pragma once
 
 #include <fstream>
+#include <set>
 #include <string>
 #include <vector>
 
@@ -56,18 +57,20 @@ TTable CommandsTable(size_t instances, const std::string& commandHeading, const 
 // "prefix" + index + ".txt".
 std::string NumberedFileName(const std::string& prefix, int index);
 
-// Whether `name` can be written as a file of its own in the report's
-// directory and linked from a page as it stands: printable ASCII letters,
-// digits, blanks and ". _ - + = , @", neither beginning with a dot nor
-// beginning or ending with a blank, at most 128 bytes, and not of a kind the
-// report writes itself (".html", ".htm", ".css", ".js"). Everything else
-// (an absolute path, "..", a separator, a control character, a character
-// that a link would read as mark-up, a scheme, a query or a fragment) is not.
-bool IsPlainFileName(const std::string& name);
+// Whether `name` is a safe name for a file of its own in the report's
+// directory: not empty, no "/" and no NUL byte, neither "." nor "..", at
+// most 255 bytes (what a file system holds in one name), and not of a kind
+// the report writes itself (".html", ".htm", ".css", ".js", in any case), so
+// that a result never takes the place of a page. Any other byte is allowed:
+// the name is percent-encoded in the link (ResultLinkCell) and escaped
+// wherever it is shown.
+bool IsSafeFileName(const std::string& name);
 
 // The file name under which a result named by collected text is written:
-// the text itself when IsPlainFileName holds, else `fallback`.
-std::string ResultFileName(const std::string& name, const std::string& fallback);
+// the text itself when IsSafeFileName holds and no earlier result of the
+// page took that name (`used`), else `fallback`. The name chosen is added
+// to `used`, so two results never share a file.
+std::string ResultFileName(const std::string& name, const std::string& fallback, std::set<std::string>& used);
 
 // A result file opened for writing, truncating an earlier one. The
 // constructor throws TTKRException with kResultFileDenied when access to
@@ -108,7 +111,9 @@ TTable FillCommandsTable(TWriter& writer, const std::string& outputPath, const T
                          const TCommandTable& layout);
 
 // Cell texts of one row: the command made safe by the writer, and the
-// relative link to the result file.
+// relative link to the result file, its name percent-encoded (every byte
+// but ASCII letters, digits and "-._~"), so that any safe file name links
+// to itself and nothing in it reads as mark-up, a scheme or a query.
 std::string CommandCell(TWriter& writer, const std::string& command, const std::string& opening = kCommandOpen);
 std::string ResultLinkCell(const std::string& fileName, const std::string& opening = kResultLinkOpen);
 

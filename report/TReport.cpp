@@ -145,14 +145,34 @@ void TReport::Write(TWriter* writer, TContext context) {
 }
 
 // One step of a report's walk. The walk is planned first, then carried out,
-// so that the pages it will ask for can be counted before it starts.
+// so that the pages it will ask for can be counted before it starts. The
+// operating system logs are planned as one step, kOSLogs, that stands for
+// the steps OSLogsSteps gives: the OS type is asked only when the walk
+// reaches that category, so that what finding it logs stands inside it.
+// The count takes the type the writer found when it was set up.
 struct TReport::TStep {
-    enum EKind { kCategoryLog, kTrace, kError, kStartReport, kWriteCategory, kEndCategory, kPage };
+    enum EKind { kCategoryLog, kTrace, kError, kStartReport, kWriteCategory, kEndCategory, kPage, kOSLogs };
     EKind fKind;
     std::string fText;
 };
 
-std::vector<TReport::TStep> TReport::PlanCategories(const TReportParametersBuilder& builder) const {
+// The heading and page of the operating system logs for an OS type: Windows
+// (0, 1) or Linux (2, 3) logs; any other type has neither.
+std::vector<TReport::TStep> TReport::OSLogsSteps(int osType) {
+    std::vector<TStep> steps;
+    if (osType == 0 || osType == 1) {
+        steps.push_back(TStep{TStep::kWriteCategory, CATEGORY_WINDOWS_LOGS});
+        steps.push_back(TStep{TStep::kPage, PAGE_OS_LOGS});
+    } else if (osType == 2 || osType == 3) {
+        steps.push_back(TStep{TStep::kWriteCategory, CATEGORY_LINUX_LOGS});
+        steps.push_back(TStep{TStep::kPage, PAGE_OS_LOGS});
+    } else {
+        steps.push_back(TStep{TStep::kError, "TReport::Write -- Unknow OS type]"});
+    }
+    return steps;
+}
+
+std::vector<TReport::TStep> TReport::PlanCategories() const {
     std::vector<TStep> plan;
     auto step = [&](TStep::EKind kind, const std::string& text) { plan.push_back(TStep{kind, text}); };
     auto pages = [&](std::initializer_list<std::string> ids) {
@@ -182,16 +202,7 @@ std::vector<TReport::TStep> TReport::PlanCategories(const TReportParametersBuild
         step(TStep::kTrace, "TReport::Write -- Under pTKR, no OS Logs information needed");
     } else {
         step(TStep::kEndCategory, "");
-        int osType = builder.GetOSType();
-        if (osType == 0 || osType == 1) {
-            step(TStep::kWriteCategory, CATEGORY_WINDOWS_LOGS);
-            step(TStep::kPage, PAGE_OS_LOGS);
-        } else if (osType == 2 || osType == 3) {
-            step(TStep::kWriteCategory, CATEGORY_LINUX_LOGS);
-            step(TStep::kPage, PAGE_OS_LOGS);
-        } else {
-            step(TStep::kError, "TReport::Write -- Unknow OS type]");
-        }
+        step(TStep::kOSLogs, "");
     }
 
     step(TStep::kCategoryLog, CATEGORY_SERVPROC_LOGS);
@@ -223,28 +234,52 @@ std::vector<TReport::TStep> TReport::PlanCategories(const TReportParametersBuild
 
 std::vector<std::string> TReport::PlannedPages(const TReportParametersBuilder& builder) const {
     std::vector<std::string> pages;
-    for (const TStep& s : PlanCategories(builder))
+    for (const TStep& s : PlanCategories()) {
         if (s.fKind == TStep::kPage) pages.push_back(s.fText);
+        if (s.fKind != TStep::kOSLogs) continue;
+        for (const TStep& os : OSLogsSteps(builder.GetOSType()))
+            if (os.fKind == TStep::kPage) pages.push_back(os.fText);
+    }
     return pages;
 }
 
 void TReport::WriteCategories(TWriter* writer, const boost::shared_ptr<TReportParametersBuilder>& builder) {
-    const std::vector<TStep> plan = PlanCategories(*builder);
-    size_t total = 0, done = 0;
-    for (const TStep& s : plan) total += s.fKind == TStep::kPage;
-    for (const TStep& s : plan) {
-        switch (s.fKind) {
-            case TStep::kCategoryLog: StartCategoryLog(s.fText); break;
-            case TStep::kTrace: Trace(s.fText); break;
-            case TStep::kError: Log(0, s.fText); break;
-            case TStep::kStartReport: writer->StartReport(); break;
-            case TStep::kWriteCategory: writer->WriteCategory(s.fText); break;
-            case TStep::kEndCategory: writer->EndCategory(); break;
-            case TStep::kPage:
-                if (fPageObserver) fPageObserver(++done, total, s.fText);
-                writer->WriteReportPage(builder, s.fText);
-                break;
+    const std::vector<TStep> plan = PlanCategories();
+    auto pages = [](const std::vector<TStep>& steps) {
+        size_t n = 0;
+        for (const TStep& s : steps) n += s.fKind == TStep::kPage;
+        return n;
+    };
+    // The operating system logs are counted by the type the writer's set-up
+    // found; should the type asked in their category differ, the total
+    // follows it.
+    const size_t osPagesPlanned = pages(OSLogsSteps(writer->GetOSType()));
+    size_t total = pages(plan), done = 0;
+    for (const TStep& s : plan) total += s.fKind == TStep::kOSLogs ? osPagesPlanned : 0;
+    for (const TStep& planned : plan) {
+        std::vector<TStep> steps(1, planned);
+        if (planned.fKind == TStep::kOSLogs) {
+            steps = OSLogsSteps(builder->GetOSType());
+            total = total - osPagesPlanned + pages(steps);
         }
+        for (const TStep& s : steps) RunStep(writer, builder, s, done, total);
+    }
+}
+
+void TReport::RunStep(TWriter* writer, const boost::shared_ptr<TReportParametersBuilder>& builder, const TStep& s,
+                      size_t& done, size_t total) {
+    switch (s.fKind) {
+        case TStep::kCategoryLog: StartCategoryLog(s.fText); break;
+        case TStep::kTrace: Trace(s.fText); break;
+        case TStep::kError: Log(0, s.fText); break;
+        case TStep::kStartReport: writer->StartReport(); break;
+        case TStep::kWriteCategory: writer->WriteCategory(s.fText); break;
+        case TStep::kEndCategory: writer->EndCategory(); break;
+        case TStep::kPage:
+            if (fPageObserver) fPageObserver(++done, total, s.fText);
+            writer->WriteReportPage(builder, s.fText);
+            break;
+        case TStep::kOSLogs: break;  // replaced by its steps before it runs
     }
 }
 

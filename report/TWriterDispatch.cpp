@@ -1,5 +1,6 @@
 // The writer's part of a report run: reading the mode flags, and turning a
 // page id into the work of its generator, with a failed page contained.
+#include <algorithm>
 #include <stdexcept>
 
 #include "braigrion/ReportDefinition.h"
@@ -135,6 +136,8 @@ void TWriter::WriteReportPage(TBuilderPtr builder, std::string pageID) {
 
 void TWriter::NotYetGenerated(const std::string& pageID) {
     Trace("TWriter::WriteReportPage -- Unknow PageID = " + pageID);
+    if (std::find(fUnavailablePages.begin(), fUnavailablePages.end(), pageID) == fUnavailablePages.end())
+        fUnavailablePages.push_back(pageID);
 }
 
 }  // namespace braigrion

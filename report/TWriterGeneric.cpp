@@ -108,8 +108,10 @@ void TWriter::WriteGenericReport(TReportParameters params) {
 }
 
 void TWriter::WriteGenericReportWithLink(TReportParameters params, const std::string& link) {
-    Trace("Entering TWriter::WriteGenericReportWithLink");
-    Trace("TWriter::WriteGenericReportWithLink -- Current report name is " + params.GetReportName());
+    // The frame of WriteGenericReport, and its opening lines; only the
+    // closing line is this writer's own.
+    Trace("TWriter::WriteGenericReport -- Enter");
+    Trace("TWriter::WriteGenericReport -- Current report name is " + params.GetReportName());
     OpenPage(fOutputPath + TOSSpecific::kFileSeparator + params.GetLinkName());
     WritePageHeader();
     if (fWriterType == TKR_REPORT_DEFINITION::TKR_WRITER_TYPE_HTML) {

@@ -1,7 +1,6 @@
 // The repository helpers of TWriterUtil: the properties behind a column,
 // dates, display names, and the instances of a table, filtered and sorted.
 #include <algorithm>
-#include <cctype>
 #include <cstdint>
 #include <numeric>
 
@@ -27,79 +26,53 @@ using NORVTKR20::TTKRException;
 
 namespace {
 
-bool IsDigit(char c) {
-    return c >= '0' && c <= '9';
-}
-
-// Natural comparison of two sort texts already in lower case: runs of
-// digits compare as numbers and go before text, runs of text compare byte
-// by byte and then by length, and a value with fewer runs goes first. An
-// empty text goes before any other. Runs of digits are read as 64-bit
-// numbers (a longer run wraps around) and compared by value.
-int NaturalCompare(const std::string& a, const std::string& b) {
-    if (a.empty() || b.empty()) return a.empty() ? (b.empty() ? 0 : -1) : 1;
-    std::string::size_type i = 0;
-    std::string::size_type j = 0;
-    while (i < a.size() && j < b.size()) {
-        const bool numberA = IsDigit(a[i]);
-        const bool numberB = IsDigit(b[j]);
-        if (numberA != numberB) return numberA ? -1 : 1;
-        if (numberA) {
-            std::uint64_t x = 0;
-            std::uint64_t y = 0;
-            for (; i < a.size() && IsDigit(a[i]); ++i) x = x * 10 + static_cast<std::uint64_t>(a[i] - '0');
-            for (; j < b.size() && IsDigit(b[j]); ++j) y = y * 10 + static_cast<std::uint64_t>(b[j] - '0');
-            if (x != y) return x < y ? -1 : 1;
-        } else {
-            std::string::size_type startA = i;
-            std::string::size_type startB = j;
-            while (i < a.size() && !IsDigit(a[i])) ++i;
-            while (j < b.size() && !IsDigit(b[j])) ++j;
-            const std::string::size_type lengthA = i - startA;
-            const std::string::size_type lengthB = j - startB;
-            const std::string::size_type common = std::min(lengthA, lengthB);
-            for (std::string::size_type k = 0; k < common; ++k) {
-                unsigned char ca = static_cast<unsigned char>(a[startA + k]);
-                unsigned char cb = static_cast<unsigned char>(b[startB + k]);
-                if (ca != cb) return ca < cb ? -1 : 1;
-            }
-            if (lengthA != lengthB) return lengthA < lengthB ? -1 : 1;
-        }
-    }
-    const bool moreA = i < a.size();
-    const bool moreB = j < b.size();
-    return moreA ? 1 : (moreB ? -1 : 0);
-}
-
-// The sort texts of all instances, read once: keys[row * keyCount + key].
+// The sort keys of all instances, read and split once:
+// tokens[row * keyCount + key]. Rows compare as the sorter compares their
+// instances (TInstanceSorter::operator()), without reading them again.
 class TSortKeys {
 public:
     TSortKeys(const std::vector<boost::shared_ptr<ICIMInstance>>& instances, const TInstanceSorter& sorter)
-        : fKeyCount(sorter.GetProperties().size()) {
+        : fKeyCount(sorter.GetProperties().size()), fConsistent(true) {
         for (const TInstanceSorter::TPropertyInfo& key : sorter.GetProperties()) fAscending.push_back(key.Ascending);
-        fTexts.reserve(instances.size() * fKeyCount);
+        fTokens.resize(instances.size() * fKeyCount);
+        std::uint64_t lowest = UINT64_MAX;
+        std::uint64_t highest = 0;
+        std::size_t slot = 0;
         for (const boost::shared_ptr<ICIMInstance>& instance : instances) {
             for (const TInstanceSorter::TPropertyInfo& key : sorter.GetProperties()) {
-                std::string text = TInstanceSorter::GetFinalPropertyValue(key.Property, instance);
-                for (char& c : text) c = static_cast<char>(std::tolower(static_cast<unsigned char>(c)));
-                fTexts.push_back(std::move(text));
+                std::vector<TInstanceSorter::TToken>& tokens = fTokens[slot++];
+                TInstanceSorter::PropertySplit(TInstanceSorter::GetFinalPropertyValue(key.Property, instance), tokens,
+                                               true);
+                for (const TInstanceSorter::TToken& token : tokens) {
+                    if (token.first != TInstanceSorter::kNumberToken) continue;
+                    lowest = std::min(lowest, token.second.number);
+                    highest = std::max(highest, token.second.number);
+                }
             }
         }
+        // Numbers compare by their signed difference, which orders them
+        // truly only while no two lie 2^63 or more apart.
+        fConsistent = highest < lowest || highest - lowest <= static_cast<std::uint64_t>(INT64_MAX);
     }
 
     // The sorter's order: the first key on which two rows differ decides,
     // reversed for a descending key; rows equal on every key tie.
     bool Less(std::size_t a, std::size_t b) const {
         for (std::size_t k = 0; k < fKeyCount; ++k) {
-            int r = NaturalCompare(fTexts[a * fKeyCount + k], fTexts[b * fKeyCount + k]);
+            int r = TInstanceSorter::CompareTokens(fTokens[a * fKeyCount + k], fTokens[b * fKeyCount + k]);
             if (r == 0) continue;
             return fAscending[k] ? r < 0 : r > 0;
         }
         return false;
     }
 
+    // Whether Less is a strict weak ordering over these rows. It is not when
+    // numbers 2^63 or more apart meet: their comparison can then go round
+    // in a circle, which only a merging sort survives.
+    bool IsConsistent() const { return fConsistent; }
+
     // The comparison as the sort algorithms take it: by value, so it only
-    // refers to the texts.
+    // refers to the tokens.
     struct TLess {
         const TSortKeys* keys;
         bool operator()(std::size_t a, std::size_t b) const { return keys->Less(a, b); }
@@ -107,8 +80,9 @@ public:
 
 private:
     std::size_t fKeyCount;
+    bool fConsistent;
     std::vector<bool> fAscending;
-    std::vector<std::string> fTexts;
+    std::vector<std::vector<TInstanceSorter::TToken>> fTokens;
 };
 
 }  // namespace
@@ -197,7 +171,7 @@ void TWriterUtil::SortInstances(std::vector<TInstancePtr>& instances, const TIns
     // Sorting positions with the same comparison puts the instances in the
     // very order that sorting them directly would.
     const TSortKeys::TLess less = {&keys};
-    if (stable) {
+    if (stable || !keys.IsConsistent()) {
         std::stable_sort(order.begin(), order.end(), less);
     } else {
         std::sort(order.begin(), order.end(), less);

@@ -57,6 +57,8 @@ public:
     // Negative, zero or positive as `a` sorts before, with or after `b`.
     static int PropertyCompare(const std::string& a, const std::string& b, bool lower);
     static void PropertySplit(const std::string& value, std::vector<TToken>& tokens, bool lower);
+    // PropertyCompare on values already split.
+    static int CompareTokens(const std::vector<TToken>& a, const std::vector<TToken>& b);
 
     // Helpers kept for callers outside the report.
     static bool IsNumber(const std::string& text);            // no byte outside '0'-'9'; true for ""

@@ -65,8 +65,11 @@ public:
 private:
     struct TStep;
     boost::shared_ptr<TReportParametersBuilder> MakeBuilder() const;
-    std::vector<TStep> PlanCategories(const TReportParametersBuilder& builder) const;
+    std::vector<TStep> PlanCategories() const;
+    static std::vector<TStep> OSLogsSteps(int osType);
     void WriteCategories(TWriter* writer, const boost::shared_ptr<TReportParametersBuilder>& builder);
+    void RunStep(TWriter* writer, const boost::shared_ptr<TReportParametersBuilder>& builder, const TStep& step,
+                 size_t& done, size_t total);
 
     boost::shared_ptr<NORVTKR20::ICIMNamespace> fNamespace;
     std::string fOutputPath;

@@ -37,9 +37,14 @@ public:
     void BaseInitialize(TNamespacePtr ns, TContext context, TBuilderPtr builder);
     void BaseDispose();
     std::string GetWriterType() const { return fWriterType; }
+    // The OS type BaseInitialize found (TReportParametersBuilder::GetOSType).
+    int GetOSType() const { return fOSType; }
     // Writes one page. A page that fails is abandoned where it stood; the
     // report goes on with the next one.
     void WriteReportPage(TBuilderPtr builder, std::string pageID);
+    // The page ids asked of this writer whose generator (or part of it) is
+    // not in this version of the library, each once, in the order asked.
+    const std::vector<std::string>& GetUnavailablePages() const { return fUnavailablePages; }
 
     // --- Value rendering ---
 
@@ -340,6 +345,7 @@ private:
     // page without generator, so that the report keeps its shape. Each call
     // stands for one page that the generator will write.
     void NotYetGenerated(const std::string& pageID);
+    std::vector<std::string> fUnavailablePages;
 
     TWriter(const TWriter&) = delete;
     TWriter& operator=(const TWriter&) = delete;

@@ -165,6 +165,9 @@ void WriteFixtureReport(TWriter& writer, const std::string& outputDir) {
     std::map<std::string, NORVTKR20::TCIMValue> context;
     writer.Initialize(ns, context, outputDir);
     writer.StartReport();
+    // A heading whose pages were none is left out of the index.
+    writer.WriteCategory("Empty heading");
+    writer.EndCategory();
     writer.WriteCategory("Hardware <&>");
     WriteDeclaredPage(writer, outputDir);
     WriteHandWrittenPage(writer, outputDir, ns);

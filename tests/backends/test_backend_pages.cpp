@@ -59,6 +59,9 @@ TEST(Backends, WriteTheReportDirectoryAsExpected) {
             EXPECT_EQ(std::string(backends::assets::kSortScript), ReadWholeFile(out.report + "/tkr_sort.js"));
         }
         EXPECT_EQ(expected, FilesUnder(out.scratch.Path()));
+        const std::string index = ReadWholeFile(out.report + "/" + pages[c.kind == "html" ? 1 : 0] + "." + c.kind);
+        EXPECT_EQ(std::string::npos, index.find("Empty heading")) << "a heading without pages";
+        EXPECT_NE(std::string::npos, index.find("Hardware")) << index;
         for (const std::string& stem : pages) {
             std::string actual = ReadWholeFile(out.report + "/" + stem + "." + c.kind);
             EXPECT_EQ(ExpectedText((c.kind == "txt" ? "text/" : "html/") + stem + "." + c.kind, actual), actual) << stem;

@@ -1,6 +1,7 @@
 // Plain-text layout: widths in characters, wrapping, aligned columns.
 #include <gtest/gtest.h>
 
+#include <algorithm>
 #include <sstream>
 
 #include "TextLayout.h"
@@ -66,6 +67,44 @@ TEST(TextLayout, ColumnsAlignAndStayWithinTheirWidths) {
     }
     EXPECT_EQ("Slot 10  Ethernet     a long note that", lines[2]);
     EXPECT_EQ(std::string(third, ' ') + "must wrap inside", lines[3]);
+}
+
+// A token of up to 40 characters is never cut: its column takes room from
+// the others (a column of short words gives it), or the line grows longer;
+// only a longer token is cut.
+TEST(TextLayout, TokensOfUpToFortyCharactersStayWhole) {
+    struct {
+        std::vector<int> widths;
+        std::vector<std::string> cells;
+        size_t lineWidth;
+        std::vector<std::string> whole;
+        bool longer;  // whether the line may (must) exceed lineWidth
+    } cases[] = {
+        {{10, 10, 80}, {"4294967264", "301448916992", "words of a note that can wrap anywhere between them"}, 40,
+         {"4294967264", "301448916992"}, false},
+        {{50, 50}, {"0000:3a:00.0-e810-c7a1-4f0b-9d2c", "fe80::3efd:feff:fe7a:1c20%ens1f0"}, 30,
+         {"0000:3a:00.0-e810-c7a1-4f0b-9d2c", "fe80::3efd:feff:fe7a:1c20%ens1f0"}, true},
+        {{20, 80}, {"Running", "a b c d e f g h"}, 22, {"Running"}, false},
+    };
+    for (const auto& c : cases) {
+        TTable table(1, static_cast<int>(c.cells.size()), false);
+        table.fColumnWidths = c.widths;
+        for (size_t i = 0; i < c.cells.size(); ++i) table.Cell(0, static_cast<int>(i)).text = c.cells[i];
+        const std::string out = RenderTextGrid(table, c.lineWidth);
+        for (const std::string& token : c.whole) EXPECT_NE(std::string::npos, out.find(token)) << out;
+        size_t longest = 0;
+        for (const std::string& line : Lines(out)) longest = std::max(longest, TextWidth(line));
+        EXPECT_EQ(c.longer, longest > c.lineWidth) << out;
+    }
+
+    TTable table(1, 2, false);
+    table.fColumnWidths = {50, 50};
+    const std::string tooLong(41, '7');
+    table.Cell(0, 0).text = tooLong;
+    table.Cell(0, 1).text = "x";
+    const std::string out = RenderTextGrid(table, 30);
+    EXPECT_EQ(std::string::npos, out.find(tooLong)) << out;
+    for (const std::string& line : Lines(out)) EXPECT_LE(TextWidth(line), 30u) << line;
 }
 
 }  // namespace

@@ -6,6 +6,7 @@
 #include <unistd.h>
 
 #include <algorithm>
+#include <cctype>
 #include <filesystem>
 #include <fstream>
 #include <regex>
@@ -68,9 +69,33 @@ TEST_F(ReportCommand, WritesAnHtmlReportAndPrintsItsIndex) {
     TCommandResult r = RunBraigrion(Args({"report", "-o", Path("report")}, SampleFiles()));
     ASSERT_EQ(0, r.fStatus) << r.fErr;
     EXPECT_EQ(Path("report") + "/index.html\n", r.fOut);
-    EXPECT_EQ("", r.fErr) << "no progress when standard error is not a terminal";
     for (const char* file : {"index.html", "navbar.html", "global.css", "tkr_sort.js", ".braigrion-report"}) {
         EXPECT_TRUE(fs::is_regular_file(Path("report") + "/" + file)) << file;
+    }
+    // No progress when standard error is not a terminal; only the summary,
+    // whose counts are those of the navigation.
+    std::smatch summary;
+    ASSERT_TRUE(std::regex_match(r.fErr, summary,
+                                 std::regex("braigrion: ([0-9]+) pages written, ([0-9]+) without data; "
+                                            "not available in this version: ([A-Za-z0-9 ]+)\n")))
+        << r.fErr;
+    const std::string navigation = Slurp(Path("report/navbar.html"));
+    auto count = [&navigation](const std::string& text) {
+        size_t n = 0;
+        for (size_t at = navigation.find(text); at != std::string::npos; at = navigation.find(text, at + 1)) ++n;
+        return std::to_string(n);
+    };
+    EXPECT_EQ(count("<a href="), summary[1].str());
+    EXPECT_EQ(count("(no data)</span>"), summary[2].str());
+
+    // A page listed as not available says so when asked for alone (the
+    // first few of them; none once every page is built).
+    std::istringstream missing(summary[3].str() == "none" ? "" : summary[3].str());
+    std::string page;
+    for (int asked = 0; asked < 3 && missing >> page; ++asked) {
+        TCommandResult alone = RunBraigrion(Args({"page", page}, SampleFiles()));
+        if (alone.fStatus == 0) continue;  // a page written in part shows that part
+        EXPECT_EQ("braigrion: page " + page + " is not available in this version\n", alone.fErr);
     }
     EXPECT_EQ(std::vector<std::string>{"report"}, Entries()) << "no work directory is left beside it";
 }
@@ -150,6 +175,75 @@ TEST_F(ReportCommand, RefusesWithOneLineAndTheRightStatus) {
     // Nothing was created, and the earlier report stands as it was.
     EXPECT_EQ((std::vector<std::string>{"a-file", "broken.xml", "earlier"}), Entries());
     EXPECT_EQ(earlierIndex, Slurp(Path("earlier/index.html")));
+}
+
+// Every long number in a table cell of a sample's HTML report (a token of
+// digits, perhaps with ". , : -", of 6 to 40 characters) stands whole in
+// the same sample's text report: the text back-end widens a column, or
+// makes a line longer, rather than cut a token.
+TEST_F(ReportCommand, TheTextReportHoldsEveryLongNumberOfTheHtmlReportWhole) {
+    // The texts of an HTML page's table cells, tags made blanks.
+    auto cellTexts = [](const std::string& html) {
+        std::vector<std::string> cells;
+        for (size_t at = html.find("<t"); at != std::string::npos; at = html.find("<t", at + 1)) {
+            if (at + 3 >= html.size() || (html[at + 2] != 'd' && html[at + 2] != 'h')) continue;
+            const size_t open = html.find('>', at);
+            const size_t close = html.find("</t", open);
+            if (open == std::string::npos || close == std::string::npos) break;
+            std::string text;
+            bool inTag = false;
+            for (size_t i = open + 1; i < close; ++i) {
+                if (html[i] == '<') inTag = true;
+                text += inTag ? ' ' : html[i];
+                if (html[i] == '>') inTag = false;
+            }
+            cells.push_back(text);
+            at = close;
+        }
+        return cells;
+    };
+    auto isNumber = [](const std::string& token) {
+        if (token.size() < 6 || token.size() > 40 || !std::isdigit(static_cast<unsigned char>(token[0]))) return false;
+        size_t digits = 0;
+        for (char c : token) {
+            if (std::isdigit(static_cast<unsigned char>(c))) {
+                ++digits;
+            } else if (std::string(".,:-").find(c) == std::string::npos) {
+                return false;
+            }
+        }
+        return digits >= 6;
+    };
+    size_t checked = 0;
+    for (const auto& sample : fs::directory_iterator(std::string(BRAIGRION_SOURCE_DIR) + "/samples")) {
+        if (!sample.is_directory()) continue;
+        const std::string name = sample.path().filename().string();
+        SCOPED_TRACE(name);
+        std::vector<std::string> files;
+        for (const auto& file : fs::directory_iterator(sample.path()))
+            if (file.path().extension() == ".xml") files.push_back(file.path().string());
+        std::sort(files.begin(), files.end());
+        ASSERT_EQ(0, RunBraigrion(Args({"report", "-q", "-o", Path(name + "-html")}, files)).fStatus);
+        ASSERT_EQ(0, RunBraigrion(Args({"report", "-q", "--format", "text", "-o", Path(name + "-text")}, files)).fStatus);
+
+        std::string text;
+        for (const auto& page : fs::directory_iterator(Path(name + "-text"))) text += Slurp(page.path().string());
+        for (const auto& page : fs::directory_iterator(Path(name + "-html"))) {
+            if (page.path().extension() != ".html") continue;
+            // In the default mode the text report leaves its error log page
+            // empty on purpose.
+            if (page.path().filename() == "tkr_log.html") continue;
+            for (const std::string& cell : cellTexts(Slurp(page.path().string()))) {
+                std::istringstream tokens(cell);
+                for (std::string token; tokens >> token;) {
+                    if (!isNumber(token)) continue;
+                    ++checked;
+                    EXPECT_NE(std::string::npos, text.find(token)) << token << " of " << page.path().filename();
+                }
+            }
+        }
+    }
+    EXPECT_GT(checked, 100u) << "the samples hold long numbers";
 }
 
 // One page on standard output, as an inventory page: its title, its tables

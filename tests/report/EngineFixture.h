@@ -65,9 +65,10 @@ public:
     TWriterType writer;
 };
 
-// Adapters a1 (ports eth1 10G, eth0 1G, eth9 1G), a2 (eth2 25G) and a3 (no
-// port), the ports reached through an association.
-inline boost::shared_ptr<repository::TMemoryNamespace> AdaptersWithPorts() {
+// Adapters a1, a2 and a3, each with the ports that `links` give it as
+// (adapter, port name, speed), the ports reached through an association.
+typedef std::vector<std::vector<std::string>> TPortLinks;
+inline boost::shared_ptr<repository::TMemoryNamespace> AdaptersWithPorts(const TPortLinks& links) {
     using namespace testrepo;
     using NORVTKR20::TCIMValue;
     auto ns = repository::TMemoryNamespace::Create();
@@ -76,8 +77,6 @@ inline boost::shared_ptr<repository::TMemoryNamespace> AdaptersWithPorts() {
                                           P("Speed", T::eString)}));
     ns->DeclareClass(C("ORVSG_AdapterPort", "", {Ref("Antecedent", "ORVSG_Adapter"), Ref("Dependent", "ORVSG_Port")},
                        {Q("Association", TCIMValue::Boolean(true))}));
-    const char* const links[][3] = {{"a1", "eth1", "10G"}, {"a1", "eth0", "1G"}, {"a1", "eth9", "1G"},
-                                    {"a2", "eth2", "25G"}};
     for (const char* adapter : {"a1", "a2", "a3"}) ns->AddInstance("ORVSG_Adapter", {V("DeviceID", TCIMValue(adapter))});
     for (const auto& link : links) {
         ns->AddInstance("ORVSG_Port", {V("Name", TCIMValue(link[1])), V("Speed", TCIMValue(link[2]))});
@@ -87,6 +86,12 @@ inline boost::shared_ptr<repository::TMemoryNamespace> AdaptersWithPorts() {
     }
     ns->Link();
     return ns;
+}
+
+// Adapters a1 (ports eth1 10G, eth0 1G, eth9 1G), a2 (eth2 25G) and a3 (no
+// port).
+inline boost::shared_ptr<repository::TMemoryNamespace> AdaptersWithPorts() {
+    return AdaptersWithPorts({{"a1", "eth1", "10G"}, {"a1", "eth0", "1G"}, {"a1", "eth9", "1G"}, {"a2", "eth2", "25G"}});
 }
 
 }  // namespace testing

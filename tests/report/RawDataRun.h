@@ -43,9 +43,10 @@ public:
     }
 };
 
-class TRawDataRun {
+template <typename TWriterType = TEscapingWriter>
+class TBasicRawDataRun {
 public:
-    explicit TRawDataRun(boost::shared_ptr<NORVTKR20::ICIMNamespace> ns, const std::string& writerType = "html",
+    explicit TBasicRawDataRun(boost::shared_ptr<NORVTKR20::ICIMNamespace> ns, const std::string& writerType = "html",
                          const std::string& mode = "luz")
         : writer(writerType) {
         const ::testing::TestInfo* test = ::testing::UnitTest::GetInstance()->current_test_info();
@@ -61,7 +62,7 @@ public:
         writer.Clear();
         log.Clear();
     }
-    ~TRawDataRun() { std::filesystem::remove_all(fRoot); }
+    ~TBasicRawDataRun() { std::filesystem::remove_all(fRoot); }
 
     // The report's directory; its parent holds nothing else.
     std::string Dir() const { return (fRoot / "report").string(); }
@@ -119,11 +120,13 @@ public:
     void Block(const std::string& name) const { std::filesystem::create_directory(Dir() + "/" + name); }
 
     TLogCapture log;
-    TEscapingWriter writer;
+    TWriterType writer;
 
 private:
     std::filesystem::path fRoot;
 };
+
+typedef TBasicRawDataRun<> TRawDataRun;
 
 }  // namespace testing
 }  // namespace braigrion

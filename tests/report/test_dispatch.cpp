@@ -40,7 +40,7 @@ struct TDispatchCase {
 // Each case as "## name", the lines the dispatch and the generator log (a
 // page still without generator as its "Unknow PageID" line), the index
 // entries of the pages written, and the number of back-end calls. Critical details are an inventory page
-// only; a VMware host has no configuration files page; the GPU log's delta
+// only; a VMware host has the Linux configuration files page; the GPU log's delta
 // line names the settings page; the BIOS settings page needs its switch; no
 // page id reaches the Diablo generator, and an empty id reaches none.
 TEST(Dispatch, GeneratorsDecideByTheModeFlags) {

@@ -71,14 +71,18 @@ TEST(LSIRawData, PresenceTestsAskTheirOwnClasses) {
     }
 }
 
-// A command names its result file only when it is a plain name inside the
-// report's directory; any other is written under a numbered name, the link
-// follows the file, and the command is shown escaped. A command that cannot
-// be read repeats the row before it. See raw/fio.txt.
-TEST(FIORawData, CommandTextsNeverWriteOutsideTheReport) {
+// A command names its result file whenever it is a safe name in the
+// report's directory, whatever bytes it holds (its link percent-encoded, the
+// command shown escaped); a path, ".", "..", an empty or over-long name, a
+// name of the report's own kind of file and a name an earlier row took are
+// written under a numbered name, and the link follows the file. A command
+// that cannot be read repeats the row before it, its result in a file of
+// its own. See raw/fio.txt.
+TEST(FIORawData, CommandTextsNameTheirFilesOnlyInsideTheReport) {
     const std::vector<std::string> commands = {
         "fio-status -a", "../escaped.txt", "/tmp/absolute.txt", "sub/dir.txt", "back\\slash.txt", "bell\x07name",
-        "<img src=x onerror=alert(1)>", "index.html", "..", "", "javascript:alert(1)", "fio-pci-check"};
+        "<img src=x onerror=alert(1)>", "index.html", "..", "", "javascript:alert(1)", ".", std::string(256, 'x'),
+        "fio-status -a", "fio-pci-check"};
     TRepoBuilder repo;
     for (size_t i = 0; i < commands.size(); ++i) {
         repo.Add("ORV_FIORawData", {Str("Command", commands[i]), Str("CommandResult", "result " + std::to_string(i))});

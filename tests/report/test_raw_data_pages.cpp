@@ -4,8 +4,10 @@
 // file that cannot be written, and the PCI page's switch in a "luz" report.
 #include <unistd.h>
 
+#include <filesystem>
 #include <functional>
 #include <map>
+#include <stdexcept>
 #include <string>
 #include <vector>
 
@@ -211,6 +213,107 @@ TEST(PCIRawData, TheLuzPCIPageLinksToItsRawPage) {
                 run.Dump("");
     }
     EXPECT_EQ(testing::ExpectedPage("raw/pci-luz.txt", dump), dump);
+}
+
+// Each table of a raw page has its title before its rows are filled (the
+// commands escaped for their cells) and before its result files are
+// written. The writer notes, at each table title, how many result files
+// the directory holds by then.
+class TTitleWatchingWriter : public testing::TEscapingWriter {
+public:
+    using TEscapingWriter::TEscapingWriter;
+    void WriteTableTitle(const std::string& title, const bool& subTitle, const bool& other) override {
+        size_t files = 0;
+        for (const auto& entry : std::filesystem::directory_iterator(OutputPath())) files += entry.is_regular_file();
+        TEscapingWriter::WriteTableTitle(title, subTitle, other);
+        Note("files " + std::to_string(files));
+    }
+};
+
+TEST(RawDataPages, TitleComesBeforeTheRowsAndTheirFiles) {
+    for (const auto& raw : kWriters) {
+        SCOPED_TRACE(raw.first);
+        TRepoBuilder repo;
+        for (const std::string& cls : raw.second.classes) {
+            repo.Add(cls, {testing::Str("Command", "tool -a"), testing::Str("InstanceID", "1:2"),
+                           testing::Str("CommandResult", "out"), testing::Str("RawData", "out"),
+                           testing::StrArray("RawResult", {"out"}), testing::StrArray("RawResults", {"out"})});
+        }
+        testing::TBasicRawDataRun<TTitleWatchingWriter> run(repo.Namespace());
+        EXPECT_NE("", raw.second.write(run.writer));
+        // Between a grid (or the page's start) and the next title no cell
+        // text is made, and at the title the files are those of the tables
+        // before it: one per table, as each class has one instance.
+        size_t tables = 0;
+        bool cellMade = false;
+        for (const std::string& call : run.writer.Calls()) {
+            if (call.compare(0, 11, "EscapeText(") == 0) cellMade = true;
+            if (call.compare(0, 15, "WriteTableTitle") == 0) {
+                EXPECT_FALSE(cellMade) << call;
+            }
+            if (call.compare(0, 6, "files ") == 0) {
+                EXPECT_EQ("files " + std::to_string(tables), call);
+            }
+            if (call.compare(0, 14, "WriteTableGrid") == 0) {
+                ++tables;
+                cellMade = false;
+            }
+        }
+        EXPECT_EQ(raw.second.classes.size(), tables);
+    }
+}
+
+// A back-end that fails while the PCI raw page is written (here at the
+// raw page's foot) costs the raw page only: the PCI page is still written,
+// without the switch, and the log tells what happened.
+class TRawPageFailingWriter : public testing::TEscapingWriter {
+public:
+    using TEscapingWriter::TEscapingWriter;
+    void OpenPage(const std::string& path) override {
+        fOpen = path;
+        TEscapingWriter::OpenPage(path);
+    }
+    void WritePageFooter() override {
+        TEscapingWriter::WritePageFooter();
+        if (fOpen.size() >= 11 && fOpen.compare(fOpen.size() - 11, 11, "pci_rawdata") == 0)
+            throw std::runtime_error("disk full");
+    }
+
+private:
+    std::string fOpen;
+};
+
+TEST(PCIRawData, AFailureInsideTheRawPageLeavesThePCIPageWithoutSwitch) {
+    TRepoBuilder repo;
+    repo.Parse(R"(
+        ORVSG_OperatingSystem ProductVendor="Red Hat" OSType=uint16:36
+        ORVSG_PCIDevice ClassCode="0200" Description="Ethernet controller"
+        ORVSG_PCIRawData Command="lspci" RawResult=string[]:"00:00.0 Host bridge"
+    )");
+    testing::TBasicRawDataRun<TRawPageFailingWriter> run(repo.Namespace());
+    run.writer.WriteReportPage(boost::make_shared<TReportParametersBuilder>(repo.Namespace(), "luz", false),
+                               TKR_REPORT_DEFINITION::PAGE_PCI_INFORMATION);
+    const std::string transcript = run.Transcript();
+    EXPECT_NE(std::string::npos, transcript.find("OpenPage(\"out/pci_info\")")) << transcript;
+    EXPECT_NE(std::string::npos, transcript.find("WriteReportTitle(\"PCI Information\", \"\", \" - [Show Rawdata Report]\")"))
+        << transcript;
+    EXPECT_NE(std::string::npos, transcript.find("WriteIndexEntry(\"pci_info\"")) << transcript;
+
+    const std::string name = "TWriter::Generator_PCIInformation";
+    const std::vector<std::string> inOrder = {
+        name + " -- Under LUZ mode, write RawData first",
+        name + " -- Exception was thrown from TWriter::WritePCIRawDataReport",
+        name + " -- TWriter::WritePCIRawDataReport failed, write the page without RawData",
+        "TWriter::WriteGenericReport -- Enter",
+        "TWriter::WriteGenericReport -- Current report name is PCI Information",
+        "Exiting TWriter::WriteGenericReportWithLink",
+        name + " -- Exiting"};
+    int last = -1;
+    for (const std::string& line : inOrder) {
+        const int at = run.log.IndexOf(line);
+        EXPECT_GT(at, last) << line;
+        last = at;
+    }
 }
 
 }  // namespace

