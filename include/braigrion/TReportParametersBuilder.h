@@ -72,6 +72,12 @@ public:
     TReportParameters BuildPCIInfoParams() const;
     TReportParameters BuildFirmwareParams() const;
 
+    // Adapter pages of outside vendors.
+    TReportParameters BuildBroadcomParams() const;
+    TReportParameters BuildQlogicParams() const;
+    TReportParameters BuildEmulexParams() const;
+    TReportParameters BuildBrocadeParams() const;
+
 private:
     // The operating system as read from the one instance of the OS class;
     // kOSUnknown when there is not exactly one.
