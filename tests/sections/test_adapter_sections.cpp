@@ -17,6 +17,7 @@ namespace braigrion {
 namespace {
 
 using testing::TRawDataRun;
+using testing::TProp;
 using testing::TRepoBuilder;
 typedef std::vector<std::string> TLines;
 
@@ -235,6 +236,33 @@ TEST(Brocade, CountsPortsAndSplitsTheWorldWideNames) {
     TRun card("Brocade_PhysicalPackage Tag=\"card\"");
     card.Page(TKR_REPORT_DEFINITION::PAGE_BROCADE_ADAPTER);
     EXPECT_TRUE(card.run->log.Contains("Exiting TWriter::WriteBrocadeReport. There is no Port Controller or FCPort."));
+}
+
+// The ports a controller reaches through the association: counted, and
+// their node and port names cut from the element name at its first colon;
+// a name without a colon is all node name.
+TEST(Brocade, WritesTheControllersPorts) {
+    TRun run("BROCADE_PortController DeviceID=\"bfa0\"\n"
+             "BROCADE_FCPort DeviceID=\"bfa0/0\" ElementName=\"20000005331a2b3c:10000005331a2b3c\"\n"
+             "BROCADE_FCPort DeviceID=\"bfa0/1\" ElementName=\"unnamed\"\n");
+    for (const char* port : {"bfa0/0", "bfa0/1"}) {
+        using NORVTKR20::TCIMReference;
+        using NORVTKR20::TCIMValue;
+        TProp controller;
+        controller.fName = "Antecedent";
+        controller.fValue = TCIMValue(TCIMReference(run.repo.Namespace(), "BROCADE_PortController.DeviceID=\"bfa0\"", {}));
+        TProp fcPort;
+        fcPort.fName = "Dependent";
+        fcPort.fValue =
+            TCIMValue(TCIMReference(run.repo.Namespace(), std::string("BROCADE_FCPort.DeviceID=\"") + port + "\"", {}));
+        run.repo.Add("BROCADE_ControlledBy", {controller, fcPort});
+    }
+    run.Page(TKR_REPORT_DEFINITION::PAGE_BROCADE_ADAPTER);
+    EXPECT_EQ((TLines{"WriteTextCell({TotalPhysicalPort width=\"10%\" label=\"Total Physical Port\"}, \"2\", \"\")",
+                      "WriteTextCell({WWNN width=\"5%\"}, \"20000005331a2b3c\", \"\")",
+                      "WriteTextCell({WWPN width=\"5%\"}, \"10000005331a2b3c\", \"\")",
+                      "WriteTextCell({WWNN width=\"5%\"}, \"unnamed\", \"\")", "WriteTextCell({WWPN width=\"5%\"}, \"\", \"\")"}),
+              run.Calls("WriteTextCell("));
 }
 
 // The adapter pages write nothing in delta mode.

@@ -133,6 +133,56 @@ TEST(MergedDevices, RedHatAndMissingDevices) {
     EXPECT_EQ(TLines{}, empty.Calls("WriteTableTitle("));
 }
 
+// A namespace that fails with `status` when asked for one class.
+class TFailingNamespace : public NORVTKR20::ICIMNamespace {
+public:
+    TFailingNamespace(boost::shared_ptr<NORVTKR20::ICIMNamespace> ns, std::string failing, int status)
+        : fNamespace(ns), fFailing(failing), fStatus(status) {}
+    boost::shared_ptr<NORVTKR20::INamespaceProvider> GetNamespaceProvider(const NORVTKR20::TCIMContext& c) override {
+        return fNamespace->GetNamespaceProvider(c);
+    }
+    boost::shared_ptr<NORVTKR20::ICIMClass> GetClass(const std::string& name, const NORVTKR20::TCIMContext& c) override {
+        if (name == fFailing) throw NORVTKR20::TTKRException(fStatus);
+        return fNamespace->GetClass(name, c);
+    }
+    boost::shared_ptr<NORVTKR20::ICIMInstance> GetInstance(const NORVTKR20::TCIMReference& path,
+                                                           const NORVTKR20::TCIMContext& c) override {
+        return fNamespace->GetInstance(path, c);
+    }
+
+private:
+    boost::shared_ptr<NORVTKR20::ICIMNamespace> fNamespace;
+    std::string fFailing;
+    int fStatus;
+};
+
+// A repository failure other than an absent class is logged from the
+// character at the position of its status on (nothing when the status lies
+// beyond the text) and abandons the page.
+TEST(MergedDevices, LogsAndPassesOnOtherFailures) {
+    struct TCase {
+        const char* cls;
+        int status;
+        const char* line;
+    } cases[] = {
+        {"ORVSG_LogicalDevice", 27, "dDevicesReport, ex.fStatusCode.fStatusCode="},
+        {"ORVSG_PCIBridge", 8, "TWriter::WriteMergedDevicesReport(3), ex.fStatusCode.fStatusCode="},
+        {"ORVSG_PCIDevice", 500, ""},
+    };
+    for (const TCase& c : cases) {
+        SCOPED_TRACE(c.cls);
+        TRepoBuilder repo;
+        repo.Parse(std::string(kWindows) + kDevices);
+        auto ns = boost::make_shared<TFailingNamespace>(repo.Namespace(), c.cls, c.status);
+        TRawDataRun run(ns);
+        run.writer.WriteReportPage(boost::make_shared<TReportParametersBuilder>(ns, "default", false),
+                                   TKR_REPORT_DEFINITION::PAGE_MERGED_DEVICE);
+        EXPECT_TRUE(run.log.Contains(c.line));
+        EXPECT_EQ(TLines{}, run.writer.CallsStartingWith("WriteIndexEntry("));
+        EXPECT_EQ(TLines{}, run.writer.CallsStartingWith("WriteTableTitle("));
+    }
+}
+
 // Each command with its output in a grid of one column; an output the
 // instance lacks shows "N/A"; a class without instances only an index line.
 // The pages exist in LUZ mode only.
