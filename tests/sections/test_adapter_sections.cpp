@@ -213,6 +213,8 @@ TEST(FusionIO, LinksItsRawPageInLuzMode) {
         EXPECT_EQ(TLines{luz ? "WriteReportTitle(\"ORV High IOPS Adapter\", \" - [Show Rawdata Report]\", \"fio_rawData\")"
                              : "WriteReportTitle(\"ORV High IOPS Adapter\", \"\", \"\")"},
                   run.Calls("WriteReportTitle(\"ORV"));
+        // The trace line of a raw page written reads "Failed", as support scripts expect.
+        EXPECT_EQ(luz, run.run->log.Contains("TWriter::WriteFIOReport -- WriteFIORawDataReport Failed"));
     }
 }
 
