@@ -7,6 +7,7 @@
 
 #include "MellanoxBlocks.h"
 #include "braigrion/TInstanceSorter.h"
+#include "braigrion/TWriterUtil.h"
 #include "tkrcore/TOSSpecific.h"
 
 namespace braigrion {
@@ -83,7 +84,7 @@ void TWriter::WriteMelodyReport(TBuilderPtr /*builder*/, std::string reportName)
 
     TInstanceSorter byScore;
     byScore.AddProperty("MelodyScore", false, false);
-    std::stable_sort(instances.begin(), instances.end(), byScore);
+    TWriterUtil::SortInstances(instances, byScore, true);
     for (const TInstancePtr& device : instances) {
         StartRow(true);
         WriteMelodyDeviceRow(device, DisplayText(device, kColumns[0]), DisplayText(device, kColumns[1]),

@@ -9,6 +9,7 @@
 
 #include "MellanoxBlocks.h"
 #include "braigrion/TInstanceSorter.h"
+#include "braigrion/TWriterUtil.h"
 #include "tkrcore/TOSSpecific.h"
 
 namespace braigrion {
@@ -140,7 +141,7 @@ void TWriter::WriteMergedDevicesReport(TBuilderPtr /*builder*/, std::string repo
     if (devices) {
         TInstances sorted = ShallowInstances(devices);
         try {
-            std::stable_sort(sorted.begin(), sorted.end(), ByClassAndName());
+            TWriterUtil::SortInstances(sorted, ByClassAndName(), true);
         } catch (const NORVTKR20::TTKRException& ex) {
             if (fPreboot) {
                 Trace("Exiting TWriter::WriteMergedDevicesReport, sort failed");
