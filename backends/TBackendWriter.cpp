@@ -439,8 +439,8 @@ void TBackendWriter::WriteMelodyDeviceRow(TInstancePtr /*device*/, const std::st
                                           const std::string& cimType, const std::string& propertyName,
                                           const std::string& value, const std::string& frequency,
                                           const std::string& commonValues, int commonFrequencies) {
-    const std::string texts[] = {score,     type,         cimType, propertyName,
-                                 value,     frequency,    commonValues, std::to_string(commonFrequencies)};
+    const std::string texts[] = {score, type,      cimType,      propertyName,
+                                 value, frequency, commonValues, std::to_string(commonFrequencies)};
     for (const std::string& text : texts) {
         THandCell cell;
         cell.fText = EscapeText(text);
