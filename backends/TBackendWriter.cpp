@@ -457,35 +457,27 @@ void TBackendWriter::WriteMelodyPrologue(const std::string& headerText) {
     fMelodyPrologue = headerText;
 }
 
+// The heading text stands above the table, which the section opens itself.
 void TBackendWriter::WriteMelodyTableStart() {
-    if (!fMelodyPrologue.empty()) {
-        TTable prologue(1, 1, false);
-        prologue.Cell(0, 0).text = EscapeText(fMelodyPrologue);
-        prologue.Cell(0, 0).flags[kSpansRow] = true;
-        WriteTableGrid(prologue);
-    }
-    StartColumnTable("100%", "Melody Device Analysis", true);
-    StartRow(false);
-    static const char* const kHeadings[] = {"Device", "Score", "Type", "CIM Type", "Property",
-                                            "Value", "Frequency", "Common Values", "Common Frequencies"};
-    for (const char* heading : kHeadings) {
-        THandCell cell;
-        cell.fHeader = true;
-        cell.fText = EscapeText(heading);
-        AddCell(cell);
-    }
-    EndRow();
+    if (fMelodyPrologue.empty()) return;
+    TTable prologue(1, 1, false);
+    prologue.Cell(0, 0).text = EscapeText(fMelodyPrologue);
+    prologue.Cell(0, 0).flags[kSpansRow] = true;
+    WriteTableGrid(prologue);
+    fMelodyPrologue.clear();
 }
 
-void TBackendWriter::WriteMelodyDeviceRow(TInstancePtr device, const std::string& score, const std::string& type,
+// One cell per column of the section's header row: the device itself is
+// told by the property and value columns.
+void TBackendWriter::WriteMelodyDeviceRow(TInstancePtr /*device*/, const std::string& score, const std::string& type,
                                           const std::string& cimType, const std::string& propertyName,
                                           const std::string& value, const std::string& frequency,
                                           const std::string& commonValues, int commonFrequencies) {
-    const std::string texts[] = {InstanceLabel(device), score, type, cimType, propertyName,
+    const std::string texts[] = {score, type,      cimType,      propertyName,
                                  value, frequency, commonValues, std::to_string(commonFrequencies)};
-    for (size_t i = 0; i < sizeof texts / sizeof texts[0]; ++i) {
+    for (const std::string& text : texts) {
         THandCell cell;
-        cell.fText = i == 0 ? texts[i] : EscapeText(texts[i]);
+        cell.fText = EscapeText(text);
         AddCell(cell);
     }
 }

@@ -72,9 +72,13 @@ void TTextWriter::WriteTableTitle(const std::string& title, const bool& subTitle
 }
 
 void TTextWriter::WriteTableGrid(TTable& table) {
+    // Grids with nothing between them (the blocks of one table, one per
+    // instance) are kept apart by a blank line.
+    if (fPageTables > 0 && fPage.size() == fGridEnd) fPage += "\n";
     ++fPageTables;
     ++fTableCounter;
     fPage += RenderTextGrid(table, kLineWidth);
+    fGridEnd = fPage.size();
 }
 
 std::string TTextWriter::EscapeText(std::string text) {

@@ -44,6 +44,8 @@ private:
     // "file.txt" for a page's link name, a web address as it is, "" for
     // anything else.
     std::string LinkTarget(const std::string& link) const;
+
+    size_t fGridEnd = 0;  // the page's length after its last grid
 };
 
 }  // namespace backends

@@ -87,19 +87,19 @@ void TWriter::Generator_LSIIDEController(TBuilderPtr /*builder*/, std::string pa
                      [&] { NotYetGenerated(pageID); });  // WriteLSIIDEReport(builder, pageID)
 }
 
-void TWriter::Generator_Mellanox(TBuilderPtr /*builder*/, std::string pageID) {
+void TWriter::Generator_Mellanox(TBuilderPtr builder, std::string pageID) {
     WriteUnlessDelta("TWriter::Generator_Mellanox", fProviderType == kDeltaProviderType,
-                     [&] { NotYetGenerated(pageID); });  // WriteMellanoxReport(builder, pageID)
+                     [&] { WriteMellanoxReport(builder, pageID); });
 }
 
-void TWriter::Generator_Solarflare(TBuilderPtr /*builder*/, std::string pageID) {
+void TWriter::Generator_Solarflare(TBuilderPtr builder, std::string pageID) {
     WriteUnlessDelta("TWriter::Generator_Solarflare", fProviderType == kDeltaProviderType,
-                     [&] { NotYetGenerated(pageID); });  // WriteSolarflareReport(builder, pageID)
+                     [&] { WriteSolarflareReport(builder, pageID); });
 }
 
-void TWriter::Generator_FusionIO(TBuilderPtr /*builder*/, std::string pageID) {
+void TWriter::Generator_FusionIO(TBuilderPtr builder, std::string pageID) {
     WriteUnlessDelta("TWriter::Generator_FusionIO", fProviderType == kDeltaProviderType,
-                     [&] { NotYetGenerated(pageID); });  // WriteFusionIOReport(builder, pageID)
+                     [&] { WriteFusionIOReport(builder, pageID); });
 }
 
 void TWriter::Generator_PMCRAID(TBuilderPtr /*builder*/, std::string pageID) {
@@ -117,24 +117,24 @@ void TWriter::Generator_HalcyonLogs(TBuilderPtr /*builder*/, std::string pageID)
                      [&] { NotYetGenerated(pageID); });  // WriteHalcyonLogsReport(builder, pageID)
 }
 
-void TWriter::Generator_QLogic(TBuilderPtr /*builder*/, std::string pageID) {
+void TWriter::Generator_QLogic(TBuilderPtr builder, std::string pageID) {
     WriteUnlessDelta("TWriter::Generator_QLogic", fProviderType == kDeltaProviderType,
-                     [&] { NotYetGenerated(pageID); });  // WriteQLogicReport(builder, pageID)
+                     [&] { WriteQLogicReport(builder, pageID); });
 }
 
-void TWriter::Generator_Emulex(TBuilderPtr /*builder*/, std::string pageID) {
+void TWriter::Generator_Emulex(TBuilderPtr builder, std::string pageID) {
     WriteUnlessDelta("TWriter::Generator_Emulex", fProviderType == kDeltaProviderType,
-                     [&] { NotYetGenerated(pageID); });  // WriteEmulexReport(builder, pageID)
+                     [&] { WriteEmulexReport(builder, pageID); });
 }
 
-void TWriter::Generator_Broadcom(TBuilderPtr /*builder*/, std::string pageID) {
+void TWriter::Generator_Broadcom(TBuilderPtr builder, std::string /*pageID*/) {
     WriteUnlessDelta("TWriter::Generator_Broadcom", fProviderType == kDeltaProviderType,
-                     [&] { NotYetGenerated(pageID); });  // WriteGenericReport(builder->BuildBroadcomParams())
+                     [&] { WriteGenericReport(builder->BuildBroadcomParams()); });
 }
 
-void TWriter::Generator_BrocadeAdapter(TBuilderPtr /*builder*/, std::string pageID) {
+void TWriter::Generator_BrocadeAdapter(TBuilderPtr builder, std::string pageID) {
     WriteUnlessDelta("TWriter::Generator_BrocadeAdapter", fProviderType == kDeltaProviderType,
-                     [&] { NotYetGenerated(pageID); });  // WriteBrocadeReport(builder, pageID)
+                     [&] { WriteBrocadeReport(builder, pageID); });
 }
 
 void TWriter::Generator_VMwareESXi(TBuilderPtr builder, std::string /*pageID*/) {

@@ -67,33 +67,33 @@ void TWriter::Generator_ServProcEvent(TBuilderPtr builder, std::string pageID) {
 
 // The pages of the service mode exist in LUZ mode only.
 
-void TWriter::Generator_QVAChipsetRegister(TBuilderPtr /*builder*/, std::string pageID) {
+void TWriter::Generator_QVAChipsetRegister(TBuilderPtr builder, std::string pageID) {
     const std::string name = "TWriter::Generator_QVAChipsetRegister";
     Trace(name + kEntering);
     if (fMode == kLuzMode) {
         if (fProviderType == kDeltaProviderType) {
             Trace(name + kDeltaDoNothing);
         } else {
-            NotYetGenerated(pageID);  // WriteQVARegisterReport(builder, pageID)
+            WriteQVARegisterReport(builder, pageID);
         }
     }
     Trace(name + kExiting);
 }
 
-void TWriter::Generator_CFTSetting(TBuilderPtr /*builder*/, std::string pageID) {
+void TWriter::Generator_CFTSetting(TBuilderPtr builder, std::string pageID) {
     const std::string name = "TWriter::Generator_CFTSetting";
     Trace(name + kEntering);
     if (fMode == kLuzMode) {
         if (fProviderType == kDeltaProviderType) {
             Trace(name + kDeltaDoNothing);
         } else {
-            NotYetGenerated(pageID);  // WriteCFTSettingReport(builder, pageID)
+            WriteCFTSettingReport(builder, pageID);
         }
     }
     Trace(name + kExiting);
 }
 
-void TWriter::Generator_NVSMILog(TBuilderPtr /*builder*/, std::string pageID) {
+void TWriter::Generator_NVSMILog(TBuilderPtr builder, std::string pageID) {
     const std::string name = "TWriter::Generator_NVSMILog";
     Trace(name + kEntering);
     if (fMode == kLuzMode) {
@@ -101,20 +101,20 @@ void TWriter::Generator_NVSMILog(TBuilderPtr /*builder*/, std::string pageID) {
             // This generator's delta line names the settings page, as it always has.
             Trace(std::string("TWriter::Generator_CFTSetting") + kDeltaDoNothing);
         } else {
-            NotYetGenerated(pageID);  // WriteNVSMILogReport(builder, pageID)
+            WriteNVSMILogReport(builder, pageID);
         }
     }
     Trace(name + kExiting);
 }
 
-void TWriter::Generator_AMDAticonfigLog(TBuilderPtr /*builder*/, std::string pageID) {
+void TWriter::Generator_AMDAticonfigLog(TBuilderPtr builder, std::string pageID) {
     const std::string name = "TWriter::Generator_AMDAticonfigLog";
     Trace(name + kEntering);
     if (fMode == kLuzMode) {
         if (fProviderType == kDeltaProviderType) {
             Trace(name + kDeltaDoNothing);
         } else {
-            NotYetGenerated(pageID);  // WriteAMDAticonfigLogReport(builder, pageID)
+            WriteAMDAticonfigLogReport(builder, pageID);
         }
     }
     Trace(name + kExiting);
@@ -138,17 +138,21 @@ void TWriter::Generator_MergedLog(TBuilderPtr builder, std::string pageID) {
                      [&] { WriteMergedLogReport(builder, pageID); });
 }
 
-// On a Red Hat system (builder->IsRedHat()) the page is left out with the
-// line "TWriter::Generator_MergedDevice -- Do not write Merged Devices under
-// RedHat platform"; that test comes with the section writer.
-void TWriter::Generator_MergedDevice(TBuilderPtr /*builder*/, std::string pageID) {
-    WriteUnlessDelta("TWriter::Generator_MergedDevice", fProviderType == kDeltaProviderType,
-                     [&] { NotYetGenerated(pageID); });  // WriteMergedDevicesReport(builder, pageID)
+// Also the analysis page of the inventory. A Red Hat system gets no merged
+// device page.
+void TWriter::Generator_MergedDevice(TBuilderPtr builder, std::string pageID) {
+    WriteUnlessDelta("TWriter::Generator_MergedDevice", fProviderType == kDeltaProviderType, [&] {
+        if (builder->IsRedHat()) {
+            Trace("TWriter::Generator_MergedDevice -- Do not write Merged Devices under RedHat platform");
+        } else {
+            WriteMergedDevicesReport(builder, pageID);
+        }
+    });
 }
 
-void TWriter::Generator_Melody(TBuilderPtr /*builder*/, std::string pageID) {
+void TWriter::Generator_Melody(TBuilderPtr builder, std::string pageID) {
     WriteUnlessDelta("TWriter::Generator_Melody", fProviderType == kDeltaProviderType,
-                     [&] { NotYetGenerated(pageID); });  // WriteMelodyReport(builder, pageID)
+                     [&] { WriteMelodyReport(builder, pageID); });
 }
 
 void TWriter::Generator_PatchBeacon(TBuilderPtr builder, std::string /*pageID*/) {

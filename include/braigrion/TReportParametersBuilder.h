@@ -93,6 +93,11 @@ public:
     TReportParameters BuildDiagsParams() const;
     TReportParameters BuildSPINTParams() const;
     TReportParameters BuildFileLoaderParams() const;
+    // Adapter pages of outside vendors.
+    TReportParameters BuildBroadcomParams() const;
+    TReportParameters BuildQlogicParams() const;
+    TReportParameters BuildEmulexParams() const;
+    TReportParameters BuildBrocadeParams() const;
 
 private:
     // The operating system as read from the one instance of the OS class;

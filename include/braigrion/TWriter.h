@@ -242,6 +242,31 @@ public:
 
     // --- Adapter, device analysis and tool output sections (sections/Mellanox*.cpp, ...) ---
 
+    // Each takes the page's report name for its index entry.
+    // Mellanox and Solarflare: a block of label and value rows per instance.
+    // The page is left open for the back-end to finish, and counts as holding
+    // data only when it shows firmware.
+    void WriteMellanoxReport(TBuilderPtr builder, std::string reportName);
+    void WriteSolarflareReport(TBuilderPtr builder, std::string reportName);
+    // Declared pages; in LUZ mode the vendor tool's raw page comes first and
+    // the title links to it.
+    void WriteEmulexReport(TBuilderPtr builder, std::string reportName);
+    void WriteQLogicReport(TBuilderPtr builder, std::string reportName);
+    // Fusion-io flash adapters, with the raw page in LUZ mode.
+    void WriteFusionIOReport(TBuilderPtr builder, std::string reportName);
+    // Port controllers with their Fibre Channel and Ethernet ports.
+    void WriteBrocadeReport(TBuilderPtr builder, std::string reportName);
+    // Every logical device grouped by class; the short form for pre-boot data.
+    void WriteMergedDevicesReport(TBuilderPtr builder, std::string reportName);
+    // What the service mode's GPU and settings tools printed, command by command.
+    void WriteAMDAticonfigLogReport(TBuilderPtr builder, std::string reportName);
+    void WriteNVSMILogReport(TBuilderPtr builder, std::string reportName);
+    void WriteCFTSettingReport(TBuilderPtr builder, std::string reportName);
+    // Device properties scored by how unusual their values are.
+    void WriteMelodyReport(TBuilderPtr builder, std::string reportName);
+    // The chipset's error registers, one table per register block.
+    void WriteQVARegisterReport(TBuilderPtr builder, std::string reportName);
+
     // (end of block)
 
     // --- Delta comparison (delta/) ---

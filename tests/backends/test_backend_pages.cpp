@@ -81,6 +81,28 @@ TEST(InventoryBackend, GivesThePageJustWrittenAndWritesNoFile) {
     EXPECT_EQ("inventory", writer.GetWriterType());
 }
 
+// Blocks of label and value rows written one after another, as the adapter
+// sections write them, are kept apart in the text report; a page left open
+// by its section is finished when the report ends.
+TEST(TextBackend, SeparatesBlocksThatFollowEachOther) {
+    backends::TTextWriter writer;
+    TScratchDir scratch;
+    writer.Initialize(boost::shared_ptr<NORVTKR20::ICIMNamespace>(), {}, scratch.Path());
+    writer.OpenPage(scratch.Path() + "/blocks");
+    writer.WritePageHeader();
+    for (const char* value : {"first", "second"}) {
+        TTable block(1, 2, false);
+        block.fRowHeaders = true;
+        block.Cell(0, 0).text = "Name";
+        block.Cell(0, 1).text = value;
+        writer.WriteTableGrid(block);
+    }
+    writer.WriteIndexEntry("blocks", "Blocks", true);
+    writer.EndReport();
+    const std::string page = ReadWholeFile(scratch.Path() + "/blocks.txt");
+    EXPECT_NE(std::string::npos, page.find("first\n\nName")) << page;
+}
+
 // Whatever the fixture's hostile values and names became, in every page.
 TEST(HtmlBackend, HostileValuesStayTextAndLinksStayInside) {
     backends::THtmlWriter writer;

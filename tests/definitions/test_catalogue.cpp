@@ -88,6 +88,8 @@ const TOperation kOperations[] = {
     OPERATION(BuildNetworkWithTeamingParams),  OPERATION(BuildNetworkWithoutTeamingParams),
     OPERATION(BuildHardwareInfoParams),        OPERATION(BuildPCIInfoParams),
     OPERATION(BuildFirmwareParams),
+    OPERATION(BuildBroadcomParams),            OPERATION(BuildQlogicParams),
+    OPERATION(BuildEmulexParams),              OPERATION(BuildBrocadeParams),
 };
 
 TReportParametersBuilder BuilderFor(const TEnvironment& environment) {
