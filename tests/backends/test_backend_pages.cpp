@@ -10,6 +10,7 @@
 #include "TTextWriter.h"
 #include "backends/BackendFiles.h"
 #include "backends/FixtureReport.h"
+#include "repository/MemoryRepository.h"
 
 namespace braigrion {
 namespace testing {
@@ -109,6 +110,37 @@ TEST(HtmlBackend, AFailureToWriteIsReported) {
     std::string missing = scratch.Path() + "/not-there";
     WriteFixtureReport(writer, missing);
     EXPECT_NE(std::string::npos, writer.GetFailure().find(missing + "/slots.html")) << writer.GetFailure();
+}
+
+// A section that closes a block of tables with a footer of its own before
+// the page's footer: the tables after it stay inside the page, which ends
+// with one footer.
+TEST(HtmlBackend, ARepeatedFooterStaysAtTheEnd) {
+    backends::THtmlWriter writer;
+    TScratchDir scratch;
+    writer.Initialize(repository::TMemoryNamespace::Create(), {}, scratch.Path());
+    writer.StartReport();
+    writer.OpenPage(scratch.Path() + "/lsi_mir");
+    writer.WritePageHeader();
+    writer.WriteReportTitle("LSI Controller", "", "");
+    const TReportProperty cell("Name", "100%", "", "", "", "");
+    for (const char* text : {"SSD Warranty Information", "LSI PCIe SLC/MLC Adapter Information"}) {
+        writer.StartPropertyTable("50%", "40%", text);
+        writer.StartRow(true);
+        writer.WriteTextCell(cell, text, "");
+        writer.EndRow();
+        writer.EndTable();
+        writer.WritePageFooter();
+    }
+    writer.WritePageFooter();
+    writer.ClosePage();
+    writer.WriteIndexEntry("lsi_mir", "LSI Controller", true);
+    writer.EndReport();
+    const std::string page = ReadWholeFile(scratch.Path() + "/lsi_mir.html");
+    const size_t body = page.find("</body>");
+    ASSERT_NE(std::string::npos, body) << page;
+    EXPECT_EQ(std::string::npos, page.find("</body>", body + 1)) << page;
+    EXPECT_LT(page.find("LSI PCIe SLC/MLC Adapter Information"), body) << page;
 }
 
 }  // namespace

@@ -26,11 +26,13 @@ public:
 
     // The writer's transcript with each written page folded into its
     // WriteIndexEntry line: the calls from OpenPage to ClosePage are left out.
+    // A page left without ClosePage ends at its index entry.
     std::string Transcript() const {
         std::string text;
         bool inPage = false;
         for (const std::string& call : writer.Calls()) {
             if (call.compare(0, 9, "OpenPage(") == 0) inPage = true;
+            if (call.compare(0, 16, "WriteIndexEntry(") == 0) inPage = false;
             if (!inPage) text += call + "\n";
             if (call == "ClosePage()") inPage = false;
         }
