@@ -185,6 +185,9 @@ public:
     void WriteLSIIntegratedRaidReport(bool& noCard);
     void WriteLSIIntegratedRaid1030Report();
     void WriteMegaLSIReport(bool& noCard);
+    // A MegaRAID report from the vendor provider's classes, joined by their
+    // identifiers; no page writes it.
+    void WriteLSIMegaRaidReport(bool& noCard);
     // The tables after the controllers; each says whether it wrote one.
     bool WriteSSDWarrantyInfoReport();
     bool WriteLSIPCIeSSDReport();

@@ -27,14 +27,6 @@ inline void Subclass(TRepoBuilder& repo, const std::string& className, const std
     repo.Namespace()->DeclareClass(testrepo::C(className, parent, {}));
 }
 
-// A section run in `mode` with an HTML or another writer; `write` calls the
-// section on the writer.
-template <typename TWrite>
-std::string RunSection(TRawDataRun& run, TWrite write) {
-    write(run.writer);
-    return run.Transcript();
-}
-
 // The lines of a transcript that start with `prefix`.
 inline std::vector<std::string> LinesStartingWith(const std::string& transcript, const std::string& prefix) {
     std::vector<std::string> lines;

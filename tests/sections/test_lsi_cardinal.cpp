@@ -240,15 +240,5 @@ TEST(LSISSDTables, WrittenWhenTheirClassesHoldInstances) {
     }
 }
 
-TEST(LSISSDTables, AdapterRowsInOrder) {
-    TRepoBuilder repo;
-    repo.Parse("ORV_PCIeSSDWrapDriveInfo Name=\"wd0\"\nORV_SSDWarrantyInfo SSDID=\"0\"");
-    TRawDataRun run(repo.Namespace(), "html", "default");
-    run.writer.WriteSSDWarrantyInfoReport();
-    run.writer.WriteLSIPCIeSSDReport();
-    const std::string page = run.Transcript();
-    EXPECT_EQ(testing::ExpectedPage("storage/lsi-ssd-tables.txt", page), page);
-}
-
 }  // namespace
 }  // namespace braigrion

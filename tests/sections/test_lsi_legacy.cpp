@@ -171,5 +171,48 @@ TEST(LSILegacy, Report1030) {
     EXPECT_EQ(testing::ExpectedPage("storage/lsi-1030.txt", page), page);
 }
 
+// The report from the vendor classes joined by identifiers: the card,
+// BIOS and RAID level are those whose ids hold the port's or the pool's id,
+// not their neighbours'; a drive without matching extent shows empty size
+// cells. Without the card class nothing is written.
+TEST(LSIMegaRaidByIdentifiers, JoinsByTheIdsTheyHold) {
+    TRepoBuilder repo;
+    repo.Parse(R"(
+        LSIESG_MegaRAIDHBA Name="hba0"
+        LSIESG_DAPort InstanceID="500605B0:0"
+        LSIESG_PhysicalCard Tag="other card" Model="wrong"
+        LSIESG_PhysicalCard Tag="card 500605B0:0" Model="MegaRAID SAS 9361-8i"
+        LSIESG_ControllerBIOSIdentity InstanceID="BIOS 500605B0:0" VersionString="6.36"
+        LSIESG_StoragePool InstanceID="pool 1" ElementName="DG 1"
+        LSIESG_StorageVolumeSetting InstanceID="setting pool 2" ElementName="RAID0"
+        LSIESG_StorageVolumeSetting InstanceID="setting pool 1" ElementName="RAID5"
+        LSIESG_DiskExtent DeviceID="extent 252:3" ExtentStatus=uint16:2
+        LSIESG_DiskDrive DeviceID="252:4" Name="Drive 252:4"
+    )");
+    const std::string hba = "LSIESG_MegaRAIDHBA.Name=\"hba0\"";
+    Link(repo, "LSIESG_SystemDevice", hba, "LSIESG_DAPort.InstanceID=\"500605B0:0\"", "GroupComponent",
+         "PartComponent");
+    Link(repo, "LSIESG_HostedStoragePool", hba, "LSIESG_StoragePool.InstanceID=\"pool 1\"", "GroupComponent",
+         "PartComponent");
+    Link(repo, "LSIESG_MemberOfCollection", "LSIESG_StoragePool.InstanceID=\"pool 1\"",
+         "LSIESG_DiskExtent.DeviceID=\"extent 252:3\"", "Collection", "Member");
+    Link(repo, "LSIESG_SystemDevice", hba, "LSIESG_DiskDrive.DeviceID=\"252:4\"", "GroupComponent", "PartComponent");
+    TRawDataRun run(repo.Namespace(), "html", "default");
+    bool noCard = true;
+    run.writer.WriteLSIMegaRaidReport(noCard);
+    const std::string page = run.Transcript();
+    EXPECT_FALSE(noCard);
+    EXPECT_EQ(testing::ExpectedPage("storage/lsi-megaraid-by-ids.txt", page), page);
+
+    TRepoBuilder withoutCards;
+    withoutCards.Parse("LSIESG_MegaRAIDHBA Name=\"hba0\"");
+    TRawDataRun empty(withoutCards.Namespace(), "html", "default");
+    noCard = true;
+    empty.writer.WriteLSIMegaRaidReport(noCard);
+    EXPECT_TRUE(noCard);
+    EXPECT_EQ("", empty.Transcript());
+    EXPECT_TRUE(empty.log.Contains("TWriter::WriteLSIMegaRaidReport -- raidCSClass = NULL && raidCardClass = NULL"));
+}
+
 }  // namespace
 }  // namespace braigrion
