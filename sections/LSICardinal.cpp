@@ -179,10 +179,34 @@ void WriteLogicalDriveTable(TWriter& writer, const TWriter::TInstancePtr& system
     writer.EndTable();
 }
 
+// The legacy collector's drives, read once for a drive table and only when
+// a drive needs them.
+class TLegacyDrives {
+public:
+    explicit TLegacyDrives(const TWriter::TNamespacePtr& ns) : fNamespace(ns), fRead(false) {}
+    // The drive at `position`; none beyond the list or without the class.
+    TWriter::TInstancePtr At(size_t position) {
+        if (!fRead) {
+            fRead = true;
+            try {
+                fDrives = InstancesOf(fNamespace, "ORVSG_MegaLSIDiskDrive");
+            } catch (...) {
+                fDrives.clear();
+            }
+        }
+        return position < fDrives.size() ? fDrives[position] : TWriter::TInstancePtr();
+    }
+
+private:
+    TWriter::TNamespacePtr fNamespace;
+    bool fRead;
+    TInstances fDrives;
+};
+
 // The FRU number and manufacturer rows of a drive: from the physical drive
 // the provider published, else from the legacy provider's drive at the same
 // position, else the association cell, which stays empty.
-void WriteDriveOrigin(TWriter& writer, const TWriter::TNamespacePtr& ns, const TWriter::TInstancePtr& drive,
+void WriteDriveOrigin(TWriter& writer, TLegacyDrives& legacyDrives, const TWriter::TInstancePtr& drive,
                       size_t position, bool manufacturer) {
     const TReportProperty label =
         manufacturer ? Row("Manufacturer", "Manufacturer") : Row("FRUNumber", "FRU Number");
@@ -200,16 +224,13 @@ void WriteDriveOrigin(TWriter& writer, const TWriter::TNamespacePtr& ns, const T
         WriteMixedRow(writer, drive, label, drive, value);
         return;
     }
-    try {
-        const TInstances legacy = InstancesOf(ns, "ORVSG_MegaLSIDiskDrive");
-        // A drive beyond the legacy list has no counterpart there.
-        if (position < legacy.size()) {
-            WriteMixedRow(writer, drive, label, legacy[position], Row(manufacturer ? "InquiryData" : "ORVFruCru"));
-            return;
-        }
-    } catch (...) {
+    // A drive beyond the legacy list has no counterpart there.
+    const TWriter::TInstancePtr legacy = legacyDrives.At(position);
+    if (legacy) {
+        WriteMixedRow(writer, drive, label, legacy, Row(manufacturer ? "InquiryData" : "ORVFruCru"));
+    } else {
+        WriteMixedRow(writer, drive, label, drive, value);
     }
-    WriteMixedRow(writer, drive, label, drive, value);
 }
 
 void WritePhysicalDriveTable(TWriter& writer, const TWriter::TNamespacePtr& ns, const TWriter::TInstancePtr& system) {
@@ -218,18 +239,19 @@ void WritePhysicalDriveTable(TWriter& writer, const TWriter::TNamespacePtr& ns, 
     const std::string title = "Physical drive information";
     writer.WriteTableTitle(title, false, false);
     writer.StartPropertyTable("50%", "40%", std::string(kControllerInformation) + " -- " + title);
+    TLegacyDrives legacyDrives(ns);
     for (size_t i = 0; i < drives.size(); ++i) {
         const TWriter::TInstancePtr& drive = drives[i];
         if (i > 0) writer.WriteRowBreak(1);
         WritePropertyRow(writer, drive, Row("Name"));
         WritePropertyRow(writer, drive, Row("ElementName"));
         WritePropertyRow(writer, drive, Row("OperationalStatus"));
-        WriteDriveOrigin(writer, ns, drive, i, false);
+        WriteDriveOrigin(writer, legacyDrives, drive, i, false);
         WriteMixedRow(writer, drive, Row("BlockSize"), drive,
                       Row("BlockSize", "", "LSIESG_MediaPresent", "LSIESG_DiskExtent"));
         WriteMixedRow(writer, drive, Row("NumberOfBlocks"), drive,
                       Row("NumberOfBlocks", "", "LSIESG_MediaPresent", "LSIESG_DiskExtent"));
-        WriteDriveOrigin(writer, ns, drive, i, true);
+        WriteDriveOrigin(writer, legacyDrives, drive, i, true);
         WritePropertyRow(writer, drive,
                          Row("VersionString", "Firmware version", "LSIESG_ElementSoftwareIdentity",
                              "LSIESG_DriveFirmwareIdentity"));

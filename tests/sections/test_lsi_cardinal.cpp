@@ -141,6 +141,36 @@ TEST(LSICardinal, ControllerTablesAsExpected) {
         "TWriter::WriteLSIReportWithCardinal -- Current card is an IR controller, no Package Build vesrion "));
 }
 
+// A drive without a physical drive borrows FRU number and manufacturer from
+// the legacy collector's drive at its own position in the name order, when
+// the legacy list reaches that far.
+TEST(LSICardinal, DriveWithoutPhysicalDriveBorrowsFromTheLegacyList) {
+    struct TCase {
+        int legacyDrives;
+        const char* fruCell;
+    } cases[] = {
+        {0, "WriteValueCell(<instance LSIESG_DiskDrive.DeviceID=\"d1\",Name=\"Drive 1\">, {FRUNumber width=\"0%\" "
+            "assoc=\"LSIESG_Realizes\""},
+        {1, "WriteValueCell(<instance LSIESG_DiskDrive.DeviceID=\"d1\",Name=\"Drive 1\">, {FRUNumber width=\"0%\" "
+            "assoc=\"LSIESG_Realizes\""},
+        {2, "WriteValueCell(<instance ORVSG_MegaLSIDiskDrive.DeviceID=\"m1\",ORVFruCru=\"FRU-m1\">, {ORVFruCru"},
+    };
+    for (const TCase& c : cases) {
+        TRepoBuilder repo;
+        DeclareProviderClasses(repo);
+        AddControllers(repo);
+        for (int i = 0; i < c.legacyDrives; ++i) {
+            const std::string id = "m" + std::to_string(i);
+            repo.Parse("ORVSG_MegaLSIDiskDrive DeviceID=\"" + id + "\" ORVFruCru=\"FRU-" + id + "\"");
+        }
+        TRawDataRun run(repo.Namespace(), "html", "default");
+        const std::string page = WriteLSIPage(run);
+        EXPECT_TRUE(Has(page, c.fruCell)) << c.legacyDrives;
+        // The drive with a physical drive never borrows.
+        EXPECT_FALSE(Has(page, "ORVSG_MegaLSIDiskDrive.DeviceID=\"m0\"")) << c.legacyDrives;
+    }
+}
+
 // A chip the provider calls "UNKNOWN" takes the name of the flash board its
 // part number holds, in the repository, so later pages see it too.
 TEST(LSICardinal, UnknownChipTakesItsBoardName) {
