@@ -1,7 +1,10 @@
 // The pages "Halcyon" and "Halcyon Logs".
 #include <string>
+#include <vector>
 
 #include <gtest/gtest.h>
+
+#include "braigrion/TReport.h"
 
 #include "report/ExpectedPage.h"
 #include "sections/StorageFixture.h"
@@ -120,6 +123,20 @@ TEST(Halcyon, NoControllerNoPage) {
         TRawDataRun run(repo.Namespace(), "html", "luz");
         EXPECT_EQ("WriteIndexEntry(\"hc\", \"Halcyon\", false)\n", WriteHalcyonPage(run)) << repository;
     }
+}
+
+// An inventory back-end asked for the Halcyon page gets both Halcyon pages.
+TEST(Halcyon, InventoryPageHoldsBothPages) {
+    TRepoBuilder repo = HalcyonController("Halcyon HC-7k");
+    repo.Parse("ORVSG_LogRecord_RAIDMgrEvent RecordID=\"1\" Message=\"Build/Verify started\"");
+    testing::TRecordingWriter writer("inventory");
+    TWriter::TContext context;
+    context["pageID"] = NORVTKR20::TCIMValue(std::string("Halcyon"));
+    TReport report(repo.Namespace(), context, "out");
+    report.GetPage(&writer, context);
+    EXPECT_EQ((std::vector<std::string>{"WriteIndexEntry(\"hc\", \"Halcyon\", true)",
+                                        "WriteIndexEntry(\"halcyonlogs\", \"Halcyon Logs\", true)"}),
+              writer.CallsStartingWith("WriteIndexEntry("));
 }
 
 TRepoBuilder HalcyonLogs(const std::string& firstMessage, bool eventLogs = true) {
