@@ -33,12 +33,6 @@ void WriteNonNullRows(TWriter& writer, const TWriter::TInstancePtr& instance, co
     }
 }
 
-std::vector<TReportProperty> Rows(const std::vector<std::string>& names) {
-    std::vector<TReportProperty> rows;
-    for (const std::string& name : names) rows.push_back(Row(name));
-    return rows;
-}
-
 std::vector<TReportProperty> ControllerRows() {
     std::vector<TReportProperty> rows = Rows({"ControllerType", "ControllerStatus", "ChannelDescription", "SerialNum",
                                               "ControllerSlotInfo", "InstalledMemory", "PartNum"});

@@ -36,12 +36,6 @@ struct TIRLayout {
     std::string statusCaption, logicalCaption, physicalCaption;  // after the controller title
 };
 
-std::vector<TReportProperty> Rows(const std::vector<std::string>& names) {
-    std::vector<TReportProperty> rows;
-    for (const std::string& name : names) rows.push_back(Row(name));
-    return rows;
-}
-
 bool HasProperty(const TWriter::TInstancePtr& instance, const std::string& name) {
     try {
         return static_cast<bool>(instance->GetProperty(name, TCIMContext()));

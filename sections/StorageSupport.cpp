@@ -57,6 +57,12 @@ TReportProperty Row(const std::string& property, const std::string& label, const
     return TReportProperty(property, "0%", assocClass, assocTarget, label, defaultValue);
 }
 
+std::vector<TReportProperty> Rows(const std::vector<std::string>& names) {
+    std::vector<TReportProperty> rows;
+    for (const std::string& name : names) rows.push_back(Row(name));
+    return rows;
+}
+
 void WritePropertyRow(TWriter& writer, const TWriter::TInstancePtr& instance, const TReportProperty& property) {
     WriteMixedRow(writer, instance, property, instance, property);
 }

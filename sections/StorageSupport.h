@@ -37,6 +37,9 @@ std::string ClassNameOf(const TWriter::TInstancePtr& instance);
 TReportProperty Row(const std::string& property, const std::string& label = "", const std::string& assocClass = "",
                     const std::string& assocTarget = "", const std::string& defaultValue = "");
 
+// Rows of the properties named, in order.
+std::vector<TReportProperty> Rows(const std::vector<std::string>& names);
+
 // One row of a property table: the label of `property` as declared in the
 // class of `instance`, then its value on `instance`.
 void WritePropertyRow(TWriter& writer, const TWriter::TInstancePtr& instance, const TReportProperty& property);
