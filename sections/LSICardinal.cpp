@@ -2,9 +2,10 @@
 // classes, LSIESG_*), the choice between it and the legacy provider, and the
 // probes that tell the controller kinds apart.
 //
-// Per controller package the page holds three property tables: the
-// controller, its logical drives (volumes with their member extents) and
-// its physical drives. A table that fails is logged and the page goes on.
+// Each controller chip gets a "Controller Information" table; each
+// controller system, after its first chip, the tables of its logical drives
+// (volumes with their member extents) and of its physical drives. A table
+// that fails is logged and the page goes on.
 #include <exception>
 
 #include "StorageSupport.h"

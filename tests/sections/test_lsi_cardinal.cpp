@@ -40,7 +40,8 @@ void DeclareProviderClasses(TRepoBuilder& repo) {
 
 // Two controllers: a MegaRAID one on a SAS3108 chip with an enclosure
 // package listed between its chip and a second chip, and an IR one whose
-// chip the provider could not name. The MegaRAID controller has one volume
+// first chip the provider could not name and whose second, a SAS2004, is
+// sold as a product of its own. The MegaRAID controller has one volume
 // over two drives; one drive has a physical drive without vendor, the other
 // none at all.
 void AddControllers(TRepoBuilder& repo) {
@@ -56,6 +57,8 @@ void AddControllers(TRepoBuilder& repo) {
         LSIESG_EnclosureChassis Tag="encl0" Model="backplane"
         LSIESG_InitiatorTargetChip Tag="chip0b" Model="SAS3x28"
         LSIESG_IntegratedRaidChip Tag="chip1" Model="UNKNOWN" PartNumber="L3-NWD-BLP4-1600-B"
+        LSIESG_IntegratedRaidChip Tag="chip2" Model="LSI SAS2004"
+        LSIESG_IntegratedRaidProduct Name="SAS2004 ROMB"
         ORV_PCIeSSDWrapDriveInfo Name="wd0" BoardName="NWD-BLP4-1600"
         LSIESG_InitiatorTargetProduct Name="SAS3x28 expander product"
         LSIESG_ControllerBIOSIdentity InstanceID="b0" VersionString="6.36"
@@ -74,6 +77,9 @@ void AddControllers(TRepoBuilder& repo) {
     Link(repo, "LSIESG_ProductPhysicalComponent", "LSIESG_InitiatorTargetProduct.Name=\"SAS3x28 expander product\"",
          "LSIESG_InitiatorTargetChip.Tag=\"chip0b\"");
     Link(repo, "LSIESG_SystemPackaging", "LSIESG_IntegratedRaidChip.Tag=\"chip1\"", kIRSystem);
+    Link(repo, "LSIESG_SystemPackaging", "LSIESG_IntegratedRaidChip.Tag=\"chip2\"", kIRSystem);
+    Link(repo, "LSIESG_ProductPhysicalComponent", "LSIESG_IntegratedRaidProduct.Name=\"SAS2004 ROMB\"",
+         "LSIESG_IntegratedRaidChip.Tag=\"chip2\"");
     Link(repo, "LSIESG_ElementSoftwareIdentity", "LSIESG_ControllerBIOSIdentity.InstanceID=\"b0\"", kHBA);
     for (const char* volume : {"LSIESG_StorageVolume.DeviceID=\"v1\"", "LSIESG_StorageVolume.DeviceID=\"v0\""})
         Link(repo, "LSIESG_SystemDevice", kHBA, volume, "GroupComponent", "PartComponent");
@@ -133,7 +139,8 @@ TEST(LSICardinal, ControllerTablesAsExpected) {
     TRawDataRun run(repo.Namespace(), "html", "default");
     const std::string page = WriteLSIPage(run);
     EXPECT_EQ(testing::ExpectedPage("storage/lsi-cardinal.txt", page), page);
-    EXPECT_EQ(3u, LinesStartingWith(page, "WriteTableTitle(\"Controller Information\"").size());
+    EXPECT_EQ(4u, LinesStartingWith(page, "WriteTableTitle(\"Controller Information\"").size());
+    EXPECT_TRUE(Has(page, "WriteValueCell(<instance LSIESG_IntegratedRaidProduct.Name=\"SAS2004 ROMB\">, {Name"));
     EXPECT_EQ(1u, LinesStartingWith(page, "WriteTableTitle(\"Physical drive information\"").size());
     EXPECT_TRUE(run.log.Contains(
         "TWriter::WriteLSIReportWithCardinal -- Current card is an MR controller, write Package Build vesrion "));
@@ -180,7 +187,7 @@ TEST(LSICardinal, UnknownChipTakesItsBoardName) {
     TRawDataRun run(repo.Namespace(), "html", "default");
     WriteLSIPage(run);
     const auto chips = testrepo::All(*repo.Namespace(), "LSIESG_IntegratedRaidChip");
-    ASSERT_EQ(2u, chips.size());
+    ASSERT_EQ(3u, chips.size());
     EXPECT_EQ("SAS3108", chips[0]->GetProperty("Model", TCIMContext())->GetValue().ToString(10));
     EXPECT_EQ("NWD-BLP4-1600", chips[1]->GetProperty("Model", TCIMContext())->GetValue().ToString(10));
 }
