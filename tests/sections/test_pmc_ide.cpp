@@ -23,7 +23,7 @@ TRepoBuilder PMCController() {
     TRepoBuilder repo;
     repo.Parse(R"(
         PMC_ControllerComputerSystem Name="pmc0"
-        PMC_ApplicationSoftwareIdentity InstanceID="app" Name="maxView Storage Manager" VersionString="2.06.00"
+        PMC_ApplicationSoftwareIdentity InstanceID="app" Name="PMC Storage Manager" VersionString="2.06.00"
         PMC_Card Tag="card" Model="ASR-8805" Manufacturer="PMC-Sierra"
         PMC_FirmwareSoftwareIdentity InstanceID="fw" VersionString="7.5-0"
         PMC_StorageVolume DeviceID="ld0" RAIDLevel="RAID 1"
@@ -60,7 +60,7 @@ TEST(PMC, ControllerPageAsExpected) {
 // data.
 TEST(PMC, PageStartedEvenWithoutData) {
     for (const char* repository : {"", "class PMC_ControllerComputerSystem\nclass PMC_ApplicationSoftwareIdentity",
-                                   "PMC_ApplicationSoftwareIdentity Name=\"maxView\"\nclass PMC_ControllerComputerSystem"}) {
+                                   "PMC_ApplicationSoftwareIdentity Name=\"PMC Storage Manager\"\nclass PMC_ControllerComputerSystem"}) {
         TRepoBuilder repo;
         repo.Parse(repository);
         TRawDataRun run(repo.Namespace(), "html", "default");
