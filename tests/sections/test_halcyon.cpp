@@ -115,6 +115,18 @@ TEST(Halcyon, StripeOrderByControllerGeneration) {
     }
 }
 
+// A raw-data page that cannot write its result file gives no link; the
+// controller page is written all the same.
+TEST(Halcyon, FailedRawDataPageLeavesTheTitlePlain) {
+    TRepoBuilder repo = HalcyonController("Halcyon HC-7k");
+    TRawDataRun run(repo.Namespace(), "html", "luz");
+    run.Block("hc_RawData_Results_0.txt");
+    const std::string page = WriteHalcyonPage(run);
+    EXPECT_TRUE(Has(page, "WriteReportTitle(\"Halcyon\", \"\", \"\")")) << page;
+    EXPECT_TRUE(Has(page, "WriteIndexEntry(\"hc\", \"Halcyon\", true)")) << page;
+    EXPECT_TRUE(run.log.Contains("TWriter::WriteHalcyonRReport -- Exception was thrown from WriteHalcyonRawDataReport"));
+}
+
 TEST(Halcyon, NoControllerNoPage) {
     for (const char* repository : {"", "class ORVSG_hcSCSIProtocolController",
                                    "ORVSG_hcSCSIProtocolController DeviceID=\"hc0\"\nclass ORVSG_hcLogicalDisk"}) {
