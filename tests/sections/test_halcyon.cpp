@@ -206,6 +206,7 @@ TEST(HalcyonLogs, TablesLeftOutWithoutEvents) {
     TRawDataRun run(repo.Namespace(), "html", "luz");
     const std::string page = WriteLogsPage(run);
     EXPECT_EQ(0u, LinesStartingWith(page, "WriteTableTitle(").size()) << page;
+    EXPECT_FALSE(Has(page, "WriteHalcyonEventLog")) << page;
     EXPECT_TRUE(Has(page, "WriteIndexEntry(\"halcyonlogs\", \"Halcyon Logs\", false)")) << page;
     EXPECT_TRUE(run.log.Contains("Exiting TWriter::WriteHalcyonLogsReport(2), ex.fStatusCode.fStatusCode=15"));
     EXPECT_TRUE(run.log.Contains("Exiting TWriter::WriteHalcyonLogsReport(5), ex.fStatusCode.fStatusCode=15"));
