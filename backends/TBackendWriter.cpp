@@ -40,6 +40,7 @@ void TBackendWriter::Initialize(TNamespacePtr ns, TContext context, const std::s
     fIndex.clear();
     fCategoryOpen = false;
     fPageHadTable.clear();
+    fWrittenStems.clear();
     fTableCounter = 0;
 }
 
@@ -63,6 +64,21 @@ void TBackendWriter::WriteCategory(const std::string& categoryName) {
 
 void TBackendWriter::EndReport() {
     if (fPageOpen) ClosePage();
+    // A page that the logic only listed (its section found nothing to open
+    // a page for) still gets a file, so that its link in the index leads
+    // to a page that says there is no information.
+    if (WritesListedPages()) {
+        for (const TCategory& category : std::vector<TCategory>(fIndex)) {
+            for (const TIndexEntry& entry : category.fEntries) {
+                if (fWrittenStems.count(entry.fStem)) continue;
+                OpenPage(fOutputPath + TOSSpecific::kFileSeparator + entry.fStem);
+                WritePageHeader();
+                WriteReportTitle(entry.fName, "", "");
+                WritePageFooter();
+                ClosePage();
+            }
+        }
+    }
     // A heading with no page under it (its pages not written, or not in
     // this version) is left out of the index.
     fIndex.erase(std::remove_if(fIndex.begin(), fIndex.end(),
@@ -111,6 +127,7 @@ void TBackendWriter::ClosePage() {
     if (fHand.fOpen) EndTable();
     if (!fFooterWritten) FinishAbandonedPage();
     fPageHadTable[fPageStem] = fPageTables > 0;
+    fWrittenStems.insert(fPageStem);
     SavePage(fPageStem, fPage);
     fPage.clear();
     fPageOpen = false;
@@ -149,6 +166,7 @@ void TBackendWriter::WriteSeparatePage(const std::string& stem, const std::strin
     WriteReportTitle(title, "", "");
     WriteTableGrid(table);
     WritePageFooter();
+    fWrittenStems.insert(fPageStem);
     SavePage(fPageStem, fPage);
 
     fPageOpen = pageOpen;

@@ -5,6 +5,7 @@
 #pragma once
 
 #include <map>
+#include <set>
 #include <string>
 #include <vector>
 
@@ -109,6 +110,9 @@ protected:
     virtual void SavePage(const std::string& stem, const std::string& text) = 0;
     // Writes the index and whatever else the report needs beside its pages.
     virtual void WriteReportFiles() = 0;
+    // Whether EndReport gives a page file to every page the index lists;
+    // the inventory back-end hands over one page at a time and does not.
+    virtual bool WritesListedPages() const { return true; }
     // Finishes a page that the logic left without its foot.
     virtual void FinishAbandonedPage() = 0;
 
@@ -174,6 +178,7 @@ private:
     TTable BuildGrid(const THandTable& hand);
     // Whether each stem's page printed a table, for its index entry.
     std::map<std::string, bool> fPageHadTable;
+    std::set<std::string> fWrittenStems;  // pages saved so far
     THandTable fHand;
     std::string fMelodyPrologue;
     std::string fFailure;

@@ -1,5 +1,6 @@
 #include "THtmlWriter.h"
 
+#include <algorithm>
 #include <cctype>
 #include <cstring>
 
@@ -92,10 +93,17 @@ void THtmlWriter::WritePageHeader() {
 }
 
 void THtmlWriter::WritePageFooter() {
-    if (fPageTables == 0) fPage += kNoInfoText1 + " " + kNoInfoText2 + " " + kNoInfoText3 + "\n";
+    // A section may close a block of tables with a footer before the page's
+    // own; the page keeps one footer, after all that was written.
+    if (fFooterWritten && fPage.compare(std::min(fFooterAt, fPage.size()), fFooterText.size(), fFooterText) == 0)
+        fPage.erase(fFooterAt, fFooterText.size());
+    fFooterText.clear();
+    if (fPageTables == 0) fFooterText += kNoInfoText1 + " " + kNoInfoText2 + " " + kNoInfoText3 + "\n";
     // Sortable tables on a page that did not ask for the script get it here.
-    if (fPageHasSortable && !fSortScriptAsked) fPage += kHtmlSortScript;
-    fPage += "</body>\n" + kHtmlFooter;
+    if (fPageHasSortable && !fSortScriptAsked) fFooterText += kHtmlSortScript;
+    fFooterText += "</body>\n" + kHtmlFooter;
+    fFooterAt = fPage.size();
+    fPage += fFooterText;
     fFooterWritten = true;
 }
 

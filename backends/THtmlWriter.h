@@ -57,6 +57,9 @@ private:
     std::string IndexPage() const;
 
     bool fPageHasSortable;
+    // Where the last footer of the page stands and what it says.
+    size_t fFooterAt = 0;
+    std::string fFooterText;
 };
 
 }  // namespace backends

@@ -23,6 +23,7 @@ protected:
     std::string PageHeader(bool sortHeader) const override;
     void SavePage(const std::string& stem, const std::string& text) override;
     void WriteReportFiles() override;
+    bool WritesListedPages() const override { return false; }
 
 private:
     std::string fText;

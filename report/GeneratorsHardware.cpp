@@ -72,19 +72,19 @@ void TWriter::Generator_Environmentals(TBuilderPtr builder, std::string pageID) 
     Trace(name + kExiting);
 }
 
-void TWriter::Generator_DriveHealth(TBuilderPtr /*builder*/, std::string pageID) {
+void TWriter::Generator_DriveHealth(TBuilderPtr builder, std::string pageID) {
     WriteUnlessDelta("TWriter::Generator_DriveHealth", fProviderType == kDeltaProviderType,
-                     [&] { NotYetGenerated(pageID); });  // WriteDriveHealthReport(builder, pageID)
+                     [&] { WriteDriveHealthReport(builder, pageID); });
 }
 
-void TWriter::Generator_LSIController(TBuilderPtr /*builder*/, std::string pageID) {
+void TWriter::Generator_LSIController(TBuilderPtr builder, std::string pageID) {
     WriteUnlessDelta("TWriter::Generator_LSIController", fProviderType == kDeltaProviderType,
-                     [&] { NotYetGenerated(pageID); });  // WriteLSIReport(builder, pageID)
+                     [&] { WriteLSIReport(builder, pageID); });
 }
 
-void TWriter::Generator_LSIIDEController(TBuilderPtr /*builder*/, std::string pageID) {
+void TWriter::Generator_LSIIDEController(TBuilderPtr builder, std::string pageID) {
     WriteUnlessDelta("TWriter::Generator_LSIIDEController", fProviderType == kDeltaProviderType,
-                     [&] { NotYetGenerated(pageID); });  // WriteLSIIDEReport(builder, pageID)
+                     [&] { WriteLSIIDEReport(builder, pageID); });
 }
 
 void TWriter::Generator_Mellanox(TBuilderPtr builder, std::string pageID) {
@@ -102,19 +102,19 @@ void TWriter::Generator_FusionIO(TBuilderPtr builder, std::string pageID) {
                      [&] { WriteFusionIOReport(builder, pageID); });
 }
 
-void TWriter::Generator_PMCRAID(TBuilderPtr /*builder*/, std::string pageID) {
+void TWriter::Generator_PMCRAID(TBuilderPtr builder, std::string pageID) {
     WriteUnlessDelta("TWriter::Generator_PMCRAID", fProviderType == kDeltaProviderType,
-                     [&] { NotYetGenerated(pageID); });  // WritePMCReport(builder, pageID)
+                     [&] { WritePMCReport(builder, pageID); });
 }
 
-void TWriter::Generator_Halcyon(TBuilderPtr /*builder*/, std::string pageID) {
+void TWriter::Generator_Halcyon(TBuilderPtr builder, std::string pageID) {
     WriteUnlessDelta("TWriter::Generator_Halcyon", fProviderType == kDeltaProviderType,
-                     [&] { NotYetGenerated(pageID); });  // WriteHalcyonReport(builder, pageID)
+                     [&] { WriteHalcyonReport(builder, pageID); });
 }
 
-void TWriter::Generator_HalcyonLogs(TBuilderPtr /*builder*/, std::string pageID) {
+void TWriter::Generator_HalcyonLogs(TBuilderPtr builder, std::string pageID) {
     WriteUnlessDelta("TWriter::Generator_HalcyonLogs", fProviderType == kDeltaProviderType,
-                     [&] { NotYetGenerated(pageID); });  // WriteHalcyonLogsReport(builder, pageID)
+                     [&] { WriteHalcyonLogsReport(builder, pageID); });
 }
 
 void TWriter::Generator_QLogic(TBuilderPtr builder, std::string pageID) {

@@ -219,6 +219,39 @@ public:
 
     // --- Storage sections (sections/LSI*.cpp, Halcyon*.cpp, PMC*.cpp, DriveHealth*.cpp) ---
 
+    // The page "LSI Controller": through the Cardinal provider where it left
+    // data, else through the legacy provider's classes.
+    void WriteLSIReport(TBuilderPtr builder, std::string pageID);
+    void WriteLSIReportWithCardinal(TBuilderPtr builder, std::string pageID);
+    void WriteLSIReportWithLegacyProvider(TBuilderPtr builder, std::string pageID);
+    // Whether the Cardinal provider's classes are all there and one of them
+    // holds an instance.
+    bool isCardinalSupport();
+    // Whether a legacy controller is an LSI 1030 chip.
+    bool isLSIIntegratedRaid1030Exsited();
+    // The legacy reports: integrated RAID, its 1030 form, MegaRAID. Each sets
+    // `noCard` false when it finds a controller (the IR report true when it
+    // finds none).
+    void WriteLSIIntegratedRaidReport(bool& noCard);
+    void WriteLSIIntegratedRaid1030Report();
+    void WriteMegaLSIReport(bool& noCard);
+    // A MegaRAID report from the vendor provider's classes, joined by their
+    // identifiers; no page writes it.
+    void WriteLSIMegaRaidReport(bool& noCard);
+    // The tables after the controllers; each says whether it wrote one.
+    bool WriteSSDWarrantyInfoReport();
+    bool WriteLSIPCIeSSDReport();
+
+    // The page "LSI IDE Controller".
+    void WriteLSIIDEReport(TBuilderPtr builder, std::string pageID);
+    // The pages "Halcyon" and "Halcyon Logs".
+    void WriteHalcyonReport(TBuilderPtr builder, std::string pageID);
+    void WriteHalcyonLogsReport(TBuilderPtr builder, std::string pageID);
+    // The page "PMC RAID".
+    void WritePMCReport(TBuilderPtr builder, std::string pageID);
+    // The page "Drive Health": SMART data, tape and SCSI sense data.
+    void WriteDriveHealthReport(TBuilderPtr builder, std::string pageID);
+
     // (end of block)
 
     // --- Platform sections (sections/Firmware*.cpp, Environmentals*.cpp, BIOS*.cpp, KMC*.cpp, VCX*.cpp) ---

@@ -10,6 +10,7 @@
 #include "TTextWriter.h"
 #include "backends/BackendFiles.h"
 #include "backends/FixtureReport.h"
+#include "repository/MemoryRepository.h"
 
 namespace braigrion {
 namespace testing {
@@ -134,6 +135,69 @@ TEST(HtmlBackend, AFailureToWriteIsReported) {
     std::string missing = scratch.Path() + "/not-there";
     WriteFixtureReport(writer, missing);
     EXPECT_NE(std::string::npos, writer.GetFailure().find(missing + "/slots.html")) << writer.GetFailure();
+}
+
+// A section that closes a block of tables with a footer of its own before
+// the page's footer: the tables after it stay inside the page, which ends
+// with one footer.
+TEST(HtmlBackend, ARepeatedFooterStaysAtTheEnd) {
+    backends::THtmlWriter writer;
+    TScratchDir scratch;
+    writer.Initialize(repository::TMemoryNamespace::Create(), {}, scratch.Path());
+    writer.StartReport();
+    writer.OpenPage(scratch.Path() + "/lsi_mir");
+    writer.WritePageHeader();
+    writer.WriteReportTitle("LSI Controller", "", "");
+    const TReportProperty cell("Name", "100%", "", "", "", "");
+    for (const char* text : {"SSD Warranty Information", "LSI PCIe SLC/MLC Adapter Information"}) {
+        writer.StartPropertyTable("50%", "40%", text);
+        writer.StartRow(true);
+        writer.WriteTextCell(cell, text, "");
+        writer.EndRow();
+        writer.EndTable();
+        writer.WritePageFooter();
+    }
+    writer.WritePageFooter();
+    writer.ClosePage();
+    writer.WriteIndexEntry("lsi_mir", "LSI Controller", true);
+    writer.EndReport();
+    const std::string page = ReadWholeFile(scratch.Path() + "/lsi_mir.html");
+    const size_t body = page.find("</body>");
+    ASSERT_NE(std::string::npos, body) << page;
+    EXPECT_EQ(std::string::npos, page.find("</body>", body + 1)) << page;
+    EXPECT_LT(page.find("Adapter Information"), body) << page;
+}
+
+// A page that a section only lists in the index, without opening it, still
+// gets a file in both formats, so that its link leads somewhere; a listed
+// page that was written keeps its own file.
+TEST(Backends, APageOnlyListedInTheIndexGetsAFile) {
+    backends::THtmlWriter html;
+    backends::TTextWriter text;
+    const struct {
+        backends::TBackendWriter* writer;
+        std::string extension;
+    } cases[] = {{&html, ".html"}, {&text, ".txt"}};
+    for (const auto& c : cases) {
+        SCOPED_TRACE(c.extension);
+        TScratchDir scratch;
+        c.writer->Initialize(repository::TMemoryNamespace::Create(), {}, scratch.Path());
+        c.writer->StartReport();
+        c.writer->WriteCategory("Storage");
+        c.writer->WriteIndexEntry("lsiide", "LSI IDE Controller", false);
+        c.writer->OpenPage(scratch.Path() + "/written");
+        c.writer->WritePageHeader();
+        c.writer->WriteReportTitle("Written page", "", "");
+        c.writer->WritePageFooter();
+        c.writer->ClosePage();
+        c.writer->WriteIndexEntry("written", "Written page", false);
+        c.writer->EndCategory();
+        c.writer->EndReport();
+        const std::string listed = ReadWholeFile(scratch.Path() + "/lsiide" + c.extension);
+        EXPECT_NE(std::string::npos, listed.find("LSI IDE Controller")) << listed;
+        EXPECT_NE(std::string::npos, listed.find("No information is available")) << listed;
+        EXPECT_NE(std::string::npos, ReadWholeFile(scratch.Path() + "/written" + c.extension).find("Written page"));
+    }
 }
 
 }  // namespace
