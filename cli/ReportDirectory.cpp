@@ -199,6 +199,11 @@ void TReportDirectory::MoveInAmong(const std::vector<std::string>& files) {
                                      ", which the report did not write; nothing was replaced");
         }
     }
+    struct stat marker;
+    if (::lstat((target / kMarkerName).c_str(), &marker) == 0 && S_ISDIR(marker.st_mode)) {
+        throw std::runtime_error(ShownFileName(fTarget) + ": holds a directory " + kMarkerName +
+                                 " where the report puts its marker; nothing was replaced");
+    }
     // The files of the earlier report that this one does not write go.
     for (const std::string& file : earlier) {
         struct stat st;
