@@ -26,8 +26,8 @@ cmake --build "$BUILD_DIR" -j2 --target gen_collection bench_report >/dev/null
 mkdir -p "$OUT_DIR"
 echo "date: $(date -u '+%Y-%m-%d %H:%M UTC'), nproc $(nproc), load average $(cut -d' ' -f1-3 /proc/loadavg)"
 for n in "${COUNTS[@]}"; do
-  file=$OUT_DIR/collection-$n.xml
-  [[ -s $file ]] || "$BUILD_DIR/bench/gen_collection" "$n" "$file" >/dev/null
+  file=$OUT_DIR/collection-disks-$n.xml
+  [[ -s $file ]] || "$BUILD_DIR/bench/gen_collection" "$n" "$file" --disks >/dev/null
   cat "$file" >/dev/null  # warm the page cache
   echo "== $n instances"
   "$BUILD_DIR/bench/bench_report" "$file" | tee "$OUT_DIR/bench_report-$n.txt"
