@@ -64,6 +64,84 @@ size_t ReferenceLength(const std::string& s, size_t i) {
     return j + 1 - i;
 }
 
+void AppendUtf8(unsigned long cp, std::string& out) {
+    if (cp == 0 || cp > 0x10FFFF || (cp >= 0xD800 && cp <= 0xDFFF)) cp = 0xFFFD;
+    if (cp < 0x80) {
+        out += static_cast<char>(cp);
+    } else if (cp < 0x800) {
+        out += static_cast<char>(0xC0 | (cp >> 6));
+        out += static_cast<char>(0x80 | (cp & 0x3F));
+    } else if (cp < 0x10000) {
+        out += static_cast<char>(0xE0 | (cp >> 12));
+        out += static_cast<char>(0x80 | ((cp >> 6) & 0x3F));
+        out += static_cast<char>(0x80 | (cp & 0x3F));
+    } else {
+        out += static_cast<char>(0xF0 | (cp >> 18));
+        out += static_cast<char>(0x80 | ((cp >> 12) & 0x3F));
+        out += static_cast<char>(0x80 | ((cp >> 6) & 0x3F));
+        out += static_cast<char>(0x80 | (cp & 0x3F));
+    }
+}
+
+// The text as a browser reads it in an attribute: numeric references, with
+// or without their ';', and the named ones that matter in a link. Any other
+// '&' stays as it is (SafeHref then refuses a link that still holds a
+// complete reference).
+std::string DecodeReferences(const std::string& s) {
+    static const struct {
+        const char* name;
+        const char* text;
+    } kNamed[] = {{"amp;", "&"},    {"lt;", "<"},     {"gt;", ">"},        {"quot;", "\""},   {"apos;", "'"},
+                  {"colon;", ":"},  {"sol;", "/"},    {"bsol;", "\\"},    {"period;", "."},   {"Tab;", "\t"},
+                  {"NewLine;", "\n"}, {"lpar;", "("}, {"rpar;", ")"},       {"num;", "#"},      {"quest;", "?"},
+                  {"equals;", "="}, {"percnt;", "%"}, {"nbsp;", "\xC2\xA0"}};
+    if (s.find('&') == std::string::npos) return s;
+    std::string out;
+    out.reserve(s.size());
+    for (size_t i = 0; i < s.size();) {
+        if (s[i] != '&') {
+            out += s[i++];
+            continue;
+        }
+        size_t j = i + 1;
+        if (j < s.size() && s[j] == '#') {
+            ++j;
+            const bool hex = j < s.size() && (s[j] == 'x' || s[j] == 'X');
+            if (hex) ++j;
+            const size_t start = j;
+            unsigned long cp = 0;
+            while (j < s.size() && (hex ? std::isxdigit(static_cast<unsigned char>(s[j]))
+                                        : std::isdigit(static_cast<unsigned char>(s[j])))) {
+                const int digit = std::isdigit(static_cast<unsigned char>(s[j]))
+                                      ? s[j] - '0'
+                                      : std::tolower(static_cast<unsigned char>(s[j])) - 'a' + 10;
+                if (cp <= 0x10FFFF) cp = cp * (hex ? 16 : 10) + static_cast<unsigned long>(digit);
+                ++j;
+            }
+            if (j > start) {
+                if (j < s.size() && s[j] == ';') ++j;
+                AppendUtf8(cp, out);
+                i = j;
+                continue;
+            }
+        } else {
+            bool matched = false;
+            for (const auto& named : kNamed) {
+                const size_t n = std::strlen(named.name);
+                if (s.compare(j, n, named.name) == 0) {
+                    out += named.text;
+                    i = j + n;
+                    matched = true;
+                    break;
+                }
+            }
+            if (matched) continue;
+        }
+        out += s[i++];
+    }
+    return out;
+}
+
 // Appends the character at `i` escaped, and returns how many bytes it took.
 size_t EscapeOne(const std::string& s, size_t i, std::string& out) {
     unsigned char c = static_cast<unsigned char>(s[i]);
@@ -191,8 +269,15 @@ std::string SanitizeCellMarkup(const std::string& text) {
     return out;
 }
 
-std::string SafeHref(const std::string& link, bool allowWeb) {
+std::string SafeHref(const std::string& source, bool allowWeb) {
+    // Judge the link the browser will follow: the attribute's character
+    // references decoded. What is returned is that decoded link, holding no
+    // reference, so that escaping it writes back exactly what was judged.
+    const std::string link = DecodeReferences(source);
     if (link.empty()) return std::string();
+    for (size_t i = 0; i < link.size(); ++i) {
+        if (link[i] == '&' && ReferenceLength(link, i)) return std::string();
+    }
     for (unsigned char c : link) {
         if (c < 0x20 || c == 0x7F || c == '"' || c == '\'' || c == '<' || c == '>' || c == '\\' || c == '`')
             return std::string();

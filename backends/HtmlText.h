@@ -23,8 +23,11 @@ std::string SanitizeCellMarkup(const std::string& text);
 
 // A link target that may stand in an href: a relative path inside the
 // report (no scheme, no leading "/", no ".." step), or with `allowWeb` an
-// http or https address. "" when the target is not acceptable; the caller
-// then shows the text without a link. The result is not yet attribute-escaped.
+// http or https address. The target is judged as a browser reads it, its
+// character references decoded, and the decoded target is returned: it
+// holds no complete reference, so escaping it with EscapeHtml writes exactly
+// what was judged. "" when the target is not acceptable; the caller then
+// shows the text without a link. The result is not yet attribute-escaped.
 std::string SafeHref(const std::string& link, bool allowWeb);
 
 // A file stem for a page's link name: letters, digits, "_", "-" and "."

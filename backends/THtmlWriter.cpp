@@ -165,12 +165,17 @@ void THtmlWriter::WriteTableGrid(TTable& table) {
     auto cellText = [](const TTable::TCell& cell) {
         return KeepTokensWhole(cell.flags[kFinalText] ? cell.text : SanitizeCellMarkup(cell.text));
     };
+    // Column and row labels come from the collection's DisplayName
+    // qualifiers as often as from the catalogue: text, never mark-up.
+    auto labelText = [](const TTable::TCell& cell) {
+        return cell.flags[kFinalText] ? cell.text : EscapeHtml(cell.text);
+    };
     int firstBodyRow = 0;
     if (table.fColumnHeaders) {
         out += "<thead>" + kTableRowBeg + kTableRowMid;
         for (int c = 0; c < table.fCols; ++c) {
             out += kTableHeaderElementBegin + Percent(table.fColumnWidths[static_cast<size_t>(c)]) +
-                   kTableHeaderElementMid + cellText(table.Cell(0, c)) + kTableHeaderElementEnd;
+                   kTableHeaderElementMid + labelText(table.Cell(0, c)) + kTableHeaderElementEnd;
         }
         out += kTableRowEnd + "</thead>\n";
         firstBodyRow = 1;
@@ -188,7 +193,8 @@ void THtmlWriter::WriteTableGrid(TTable& table) {
             const TTable::TCell& cell = table.Cell(r, c);
             if ((c == 0 && table.fRowHeaders) || cell.flags[kHeaderCell]) {
                 out += kTableHeaderElementBegin + Percent(table.fColumnWidths[static_cast<size_t>(c)]) +
-                       kTableHeaderElementMid + cellText(cell) + kTableHeaderElementEnd;
+                       kTableHeaderElementMid + (c == 0 && table.fRowHeaders ? labelText(cell) : cellText(cell)) +
+                       kTableHeaderElementEnd;
                 continue;
             }
             out += "<td";

@@ -1,5 +1,5 @@
-// bench_load: loads CIM-XML files into one collection and reports how fast
-// and how big that was.
+// bench_load: loads CIM-XML files into one collection, builds its
+// association links, and reports how fast and how big that was.
 //
 //   bench_load FILE.xml [MORE.xml ...]
 //
@@ -19,6 +19,7 @@
 #include "repository/CIMXMLReader.h"
 #include "repository/MemoryClass.h"
 #include "repository/MemoryRepository.h"
+#include "repository/RepositoryIndexes.h"
 
 namespace {
 
@@ -62,6 +63,10 @@ int main(int argc, char** argv) {
         std::fprintf(stderr, "bench_load: %s\n", ex.what());
         return 1;
     }
+    const double parse = std::chrono::duration<double>(std::chrono::steady_clock::now() - start).count();
+    // The association links and the object-path indexes they need belong to
+    // the load: the first association query of a report would build them.
+    result.fNamespace->Indexes().BuildLinksNow();
     const double wall = std::chrono::duration<double>(std::chrono::steady_clock::now() - start).count();
     const TUsage after = Usage();
 
@@ -76,6 +81,7 @@ int main(int argc, char** argv) {
     std::printf("files: %zu\n", files.size());
     std::printf("file size: %llu bytes (%.1f MB)\n", bytes, megabytes);
     std::printf("wall time: %.3f s\n", wall);
+    std::printf("of which association links: %.3f s\n", wall - parse);
     std::printf("cpu time: %.3f s\n", after.fCpuSeconds - before.fCpuSeconds);
     std::printf("throughput: %.1f MB/s\n", wall > 0 ? megabytes / wall : 0.0);
     std::printf("instances: %zu\n", ns.GetInstanceCount());

@@ -1,6 +1,6 @@
 // gen_collection: writes a synthetic collection for load benchmarks.
 //
-//   gen_collection N OUT.xml [--seed S]
+//   gen_collection N OUT.xml [--seed S] [--disks]
 //
 // The file is one CIM-XML declaration document: a schema group (qualifier
 // types and the classes used) followed by N named instances shaped like what
@@ -8,7 +8,13 @@
 // thirds), PCI devices with arrays, datetimes and booleans, and association
 // instances that tie a log line to the device it talks about. Association
 // references always point at instances written earlier in the same file.
-// The output depends only on N and the seed.
+// The output depends only on N, the seed and --disks.
+//
+// With --disks the collection is one the whole report shows, associations
+// walked on every device: the operating system is named (Linux), and in
+// place of the PCI devices come disks, each with a partition and the logical
+// disk on it, tied together by two association instances (five instances a
+// disk), as the report's disk page reads them.
 
 #include <cerrno>
 #include <cinttypes>
@@ -170,6 +176,55 @@ const char kSchema[] = R"(<DECLGROUP>
   <QUALIFIER NAME="Association" TYPE="boolean"><VALUE>TRUE</VALUE></QUALIFIER>
   <PROPERTY.REFERENCE NAME="Device" REFERENCECLASS="ORVSG_PCIDevice"><QUALIFIER NAME="Key" TYPE="boolean"><VALUE>TRUE</VALUE></QUALIFIER></PROPERTY.REFERENCE>
   <PROPERTY.REFERENCE NAME="Record" REFERENCECLASS="ORVSG_LinuxEventLogRecord"><QUALIFIER NAME="Key" TYPE="boolean"><VALUE>TRUE</VALUE></QUALIFIER></PROPERTY.REFERENCE>
+</CLASS>
+</VALUE.OBJECT>
+</DECLGROUP>
+)";
+
+const char kDiskSchema[] = R"(<DECLGROUP>
+<VALUE.OBJECT>
+<CLASS NAME="ORVSG_OperatingSystem" SUPERCLASS="CIM_ManagedElement">
+  <PROPERTY NAME="CSCreationClassName" TYPE="string"><QUALIFIER NAME="Key" TYPE="boolean"><VALUE>TRUE</VALUE></QUALIFIER></PROPERTY>
+  <PROPERTY NAME="CSName" TYPE="string"><QUALIFIER NAME="Key" TYPE="boolean"><VALUE>TRUE</VALUE></QUALIFIER></PROPERTY>
+  <PROPERTY NAME="CreationClassName" TYPE="string"><QUALIFIER NAME="Key" TYPE="boolean"><VALUE>TRUE</VALUE></QUALIFIER></PROPERTY>
+  <PROPERTY NAME="Name" TYPE="string"><QUALIFIER NAME="Key" TYPE="boolean"><VALUE>TRUE</VALUE></QUALIFIER></PROPERTY>
+  <PROPERTY NAME="OSType" TYPE="uint16"/>
+  <PROPERTY NAME="Version" TYPE="string"/>
+</CLASS>
+</VALUE.OBJECT>
+<VALUE.OBJECT>
+<CLASS NAME="ORVSG_MediaAccessDevice" SUPERCLASS="CIM_LogicalDevice">
+  <PROPERTY NAME="Size" TYPE="uint64"><QUALIFIER NAME="DisplayName" TYPE="string"><VALUE>Size</VALUE></QUALIFIER></PROPERTY>
+  <PROPERTY NAME="NoOfPartitions" TYPE="uint32"><QUALIFIER NAME="DisplayName" TYPE="string"><VALUE>Partitions</VALUE></QUALIFIER></PROPERTY>
+</CLASS>
+</VALUE.OBJECT>
+<VALUE.OBJECT>
+<CLASS NAME="ORVSG_DiskPartition" SUPERCLASS="CIM_LogicalDevice">
+  <PROPERTY NAME="PartitionType" TYPE="string"/>
+  <PROPERTY NAME="PartitionSubType" TYPE="string"/>
+  <PROPERTY NAME="Size" TYPE="uint64"/>
+  <PROPERTY NAME="StartingOffset" TYPE="uint64"/>
+  <PROPERTY NAME="FaultTolerant" TYPE="boolean"/>
+</CLASS>
+</VALUE.OBJECT>
+<VALUE.OBJECT>
+<CLASS NAME="ORVSG_LogicalDisk" SUPERCLASS="CIM_LogicalDevice">
+  <PROPERTY NAME="FileSystemName" TYPE="string"/>
+  <PROPERTY NAME="Size" TYPE="uint64"/>
+</CLASS>
+</VALUE.OBJECT>
+<VALUE.OBJECT>
+<CLASS NAME="ORVSG_PartitionPresent">
+  <QUALIFIER NAME="Association" TYPE="boolean"><VALUE>TRUE</VALUE></QUALIFIER>
+  <PROPERTY.REFERENCE NAME="Antecedent" REFERENCECLASS="ORVSG_MediaAccessDevice"><QUALIFIER NAME="Key" TYPE="boolean"><VALUE>TRUE</VALUE></QUALIFIER></PROPERTY.REFERENCE>
+  <PROPERTY.REFERENCE NAME="Dependent" REFERENCECLASS="ORVSG_DiskPartition"><QUALIFIER NAME="Key" TYPE="boolean"><VALUE>TRUE</VALUE></QUALIFIER></PROPERTY.REFERENCE>
+</CLASS>
+</VALUE.OBJECT>
+<VALUE.OBJECT>
+<CLASS NAME="ORVSG_LogicalDiskBasedOnPartition">
+  <QUALIFIER NAME="Association" TYPE="boolean"><VALUE>TRUE</VALUE></QUALIFIER>
+  <PROPERTY.REFERENCE NAME="Antecedent" REFERENCECLASS="ORVSG_DiskPartition"><QUALIFIER NAME="Key" TYPE="boolean"><VALUE>TRUE</VALUE></QUALIFIER></PROPERTY.REFERENCE>
+  <PROPERTY.REFERENCE NAME="Dependent" REFERENCECLASS="ORVSG_LogicalDisk"><QUALIFIER NAME="Key" TYPE="boolean"><VALUE>TRUE</VALUE></QUALIFIER></PROPERTY.REFERENCE>
 </CLASS>
 </VALUE.OBJECT>
 </DECLGROUP>
@@ -338,14 +393,18 @@ void LogRecordName(TOutput& out, const char* indent, unsigned logIndex, std::uin
     out << indent << "</INSTANCENAME>\n";
 }
 
-void DeviceName(TOutput& out, const char* indent, std::uint64_t device) {
+void LogicalDeviceName(TOutput& out, const char* indent, const char* className, const std::string& id) {
     const std::string inner = std::string(indent) + "  ";
-    out << indent << "<INSTANCENAME CLASSNAME=\"ORVSG_PCIDevice\">\n";
+    out << indent << "<INSTANCENAME CLASSNAME=\"" << className << "\">\n";
     KeyBinding(out, inner.c_str(), "SystemCreationClassName", "ORVSG_ComputerSystem");
     KeyBinding(out, inner.c_str(), "SystemName", kHost);
-    KeyBinding(out, inner.c_str(), "CreationClassName", "ORVSG_PCIDevice");
-    KeyBinding(out, inner.c_str(), "DeviceID", DeviceId(device));
+    KeyBinding(out, inner.c_str(), "CreationClassName", className);
+    KeyBinding(out, inner.c_str(), "DeviceID", id);
     out << indent << "</INSTANCENAME>\n";
+}
+
+void DeviceName(TOutput& out, const char* indent, std::uint64_t device) {
+    LogicalDeviceName(out, indent, "ORVSG_PCIDevice", DeviceId(device));
 }
 
 void Property(TOutput& out, const char* name, const char* type, const std::string& value) {
@@ -442,8 +501,89 @@ void WriteAssociation(TOutput& out, TRandom& rng, TState& state) {
     out << "  </INSTANCE>\n</VALUE.NAMEDOBJECT>\n";
 }
 
+void LogicalDeviceKeys(TOutput& out, const char* className, const std::string& id) {
+    Property(out, "SystemCreationClassName", "string", std::string("ORVSG_ComputerSystem"));
+    Property(out, "SystemName", "string", std::string(kHost));
+    Property(out, "CreationClassName", "string", std::string(className));
+    Property(out, "DeviceID", "string", id);
+}
+
+void WriteOperatingSystem(TOutput& out) {
+    out << "<VALUE.NAMEDOBJECT>\n  <INSTANCENAME CLASSNAME=\"ORVSG_OperatingSystem\">\n";
+    KeyBinding(out, "    ", "CSCreationClassName", "ORVSG_ComputerSystem");
+    KeyBinding(out, "    ", "CSName", kHost);
+    KeyBinding(out, "    ", "CreationClassName", "ORVSG_OperatingSystem");
+    KeyBinding(out, "    ", "Name", "Red Hat Enterprise Linux Server");
+    out << "  </INSTANCENAME>\n  <INSTANCE CLASSNAME=\"ORVSG_OperatingSystem\">\n";
+    Property(out, "CSCreationClassName", "string", std::string("ORVSG_ComputerSystem"));
+    Property(out, "CSName", "string", std::string(kHost));
+    Property(out, "CreationClassName", "string", std::string("ORVSG_OperatingSystem"));
+    Property(out, "Name", "string", std::string("Red Hat Enterprise Linux Server"));
+    Property(out, "OSType", "uint16", 36);
+    Property(out, "Version", "string", std::string("7.9"));
+    out << "  </INSTANCE>\n</VALUE.NAMEDOBJECT>\n";
+}
+
+// One association instance between two logical devices, named by its path.
+void WriteDeviceLink(TOutput& out, const char* assoc, const char* fromClass, const std::string& from,
+                     const char* toClass, const std::string& to) {
+    out << "<VALUE.NAMEDOBJECT>\n  <INSTANCENAME CLASSNAME=\"" << assoc << "\">\n";
+    out << "    <KEYBINDING NAME=\"Antecedent\"><VALUE.REFERENCE>\n";
+    LogicalDeviceName(out, "      ", fromClass, from);
+    out << "    </VALUE.REFERENCE></KEYBINDING>\n    <KEYBINDING NAME=\"Dependent\"><VALUE.REFERENCE>\n";
+    LogicalDeviceName(out, "      ", toClass, to);
+    out << "    </VALUE.REFERENCE></KEYBINDING>\n  </INSTANCENAME>\n  <INSTANCE CLASSNAME=\"" << assoc << "\">\n";
+    out << "    <PROPERTY.REFERENCE NAME=\"Antecedent\" REFERENCECLASS=\"" << fromClass << "\"><VALUE.REFERENCE>\n";
+    LogicalDeviceName(out, "      ", fromClass, from);
+    out << "    </VALUE.REFERENCE></PROPERTY.REFERENCE>\n";
+    out << "    <PROPERTY.REFERENCE NAME=\"Dependent\" REFERENCECLASS=\"" << toClass << "\"><VALUE.REFERENCE>\n";
+    LogicalDeviceName(out, "      ", toClass, to);
+    out << "    </VALUE.REFERENCE></PROPERTY.REFERENCE>\n  </INSTANCE>\n</VALUE.NAMEDOBJECT>\n";
+}
+
+// A disk, its partition, the logical disk on it and the two associations.
+void WriteDisk(TOutput& out, TRandom& rng, TState& state) {
+    const std::uint64_t disk = state.fDevices++;
+    const std::string diskId = Format("/dev/disk%" PRIu64, disk);
+    const std::string partId = diskId + "p1";
+    const std::string volumeId = Format("/mnt/vol%" PRIu64, disk);
+    const std::uint64_t size = (1ull << 30) * (64 + rng.Below(4000));
+
+    out << "<VALUE.NAMEDOBJECT>\n";
+    LogicalDeviceName(out, "  ", "ORVSG_MediaAccessDevice", diskId);
+    out << "  <INSTANCE CLASSNAME=\"ORVSG_MediaAccessDevice\">\n";
+    LogicalDeviceKeys(out, "ORVSG_MediaAccessDevice", diskId);
+    Property(out, "Name", "string", diskId);
+    Property(out, "Size", "uint64", size);
+    Property(out, "NoOfPartitions", "uint32", 1);
+    out << "  </INSTANCE>\n</VALUE.NAMEDOBJECT>\n";
+
+    out << "<VALUE.NAMEDOBJECT>\n";
+    LogicalDeviceName(out, "  ", "ORVSG_DiskPartition", partId);
+    out << "  <INSTANCE CLASSNAME=\"ORVSG_DiskPartition\">\n";
+    LogicalDeviceKeys(out, "ORVSG_DiskPartition", partId);
+    Property(out, "PartitionType", "string", std::string(rng.Below(2) ? "Primary" : "Logical"));
+    Property(out, "PartitionSubType", "string", std::string("Linux LVM"));
+    Property(out, "Size", "uint64", size - (1u << 20));
+    Property(out, "StartingOffset", "uint64", 1u << 20);
+    Property(out, "FaultTolerant", "boolean", std::string(rng.Below(4) ? "FALSE" : "TRUE"));
+    out << "  </INSTANCE>\n</VALUE.NAMEDOBJECT>\n";
+
+    out << "<VALUE.NAMEDOBJECT>\n";
+    LogicalDeviceName(out, "  ", "ORVSG_LogicalDisk", volumeId);
+    out << "  <INSTANCE CLASSNAME=\"ORVSG_LogicalDisk\">\n";
+    LogicalDeviceKeys(out, "ORVSG_LogicalDisk", volumeId);
+    Property(out, "FileSystemName", "string", std::string(rng.Below(3) ? "xfs" : "ext4"));
+    Property(out, "Size", "uint64", size - (1u << 20));
+    out << "  </INSTANCE>\n</VALUE.NAMEDOBJECT>\n";
+
+    WriteDeviceLink(out, "ORVSG_PartitionPresent", "ORVSG_MediaAccessDevice", diskId, "ORVSG_DiskPartition", partId);
+    WriteDeviceLink(out, "ORVSG_LogicalDiskBasedOnPartition", "ORVSG_DiskPartition", partId, "ORVSG_LogicalDisk",
+                    volumeId);
+}
+
 int Usage() {
-    std::fprintf(stderr, "usage: gen_collection N OUT.xml [--seed S]\n");
+    std::fprintf(stderr, "usage: gen_collection N OUT.xml [--seed S] [--disks]\n");
     return 2;
 }
 
@@ -459,14 +599,19 @@ bool ParseCount(const char* text, std::uint64_t& out) {
 }  // namespace
 
 int main(int argc, char** argv) {
-    if (argc != 3 && argc != 5) return Usage();
+    if (argc < 3) return Usage();
     std::uint64_t count = 0;
     std::uint64_t seed = 20240311;
+    bool disks = false;
     if (!ParseCount(argv[1], count)) {
         std::fprintf(stderr, "gen_collection: N must be a non-negative integer, not \"%s\"\n", argv[1]);
         return 2;
     }
-    if (argc == 5 && (std::strcmp(argv[3], "--seed") != 0 || !ParseCount(argv[4], seed))) return Usage();
+    for (int i = 3; i < argc; ++i) {
+        if (std::strcmp(argv[i], "--disks") == 0) disks = true;
+        else if (std::strcmp(argv[i], "--seed") == 0 && i + 1 < argc && ParseCount(argv[i + 1], seed)) ++i;
+        else return Usage();
+    }
 
     const std::string path = argv[2];
     std::FILE* file = std::fopen(path.c_str(), "wb");
@@ -482,10 +627,23 @@ int main(int argc, char** argv) {
         TOutput out(file, path);
         out << "<?xml version=\"1.0\" encoding=\"utf-8\"?>\n"
             << "<CIM CIMVERSION=\"2.0\" DTDVERSION=\"2.0\">\n<DECLARATION>\n" << kSchema
-            << "<DECLGROUP.WITHNAME>\n";
-        for (std::uint64_t i = 0; i < count; ++i) {
+            << (disks ? kDiskSchema : "") << "<DECLGROUP.WITHNAME>\n";
+        std::uint64_t i = 0;
+        if (disks && count > 0) {
+            WriteOperatingSystem(out);
+            ++i;
+        }
+        for (; i < count; ++i) {
             const unsigned roll = rng.Below(100);
-            if (roll >= 85 && state.fDevices > 0 && !state.fRecords.empty()) {
+            if (disks && roll >= 65 && i + 5 <= count) {
+                WriteDisk(out, rng, state);
+                written[1] += 3;
+                written[2] += 2;
+                i += 4;
+            } else if (disks && roll >= 65) {
+                WriteLogRecord(out, rng, state);
+                ++written[0];
+            } else if (roll >= 85 && state.fDevices > 0 && !state.fRecords.empty()) {
                 WriteAssociation(out, rng, state);
                 ++written[2];
             } else if (roll >= 65) {

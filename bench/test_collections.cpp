@@ -207,10 +207,11 @@ TEST(SampleCollection, FilesAreValidAgainstTheDeclarationDtd) {
 
 // ------------------------------------------------------------------ generator
 
-std::string Generate(unsigned count, const std::string& name, const std::string& seed = "") {
+std::string Generate(unsigned count, const std::string& name, const std::string& seed = "", bool disks = false) {
     const std::string path = testing::TempDir() + name;
     std::string command = std::string(GEN_COLLECTION_PATH) + " " + std::to_string(count) + " " + path;
     if (!seed.empty()) command += " --seed " + seed;
+    if (disks) command += " --disks";
     command += " > /dev/null";
     EXPECT_EQ(std::system(command.c_str()), 0) << command;
     return path;
@@ -223,25 +224,47 @@ std::string Contents(const std::string& path) {
 
 TEST(GeneratedCollection, LoadsEveryInstanceWithEveryReferenceResolved) {
     const unsigned count = 600;
-    const std::string path = Generate(count, "gen-600.xml");
-    auto result = LoadCollection({path});
-    EXPECT_TRUE(result.fWarnings.empty());
-    TMemoryNamespace& ns = *result.fNamespace;
-    EXPECT_EQ(ns.GetInstanceCount(), count);
+    for (bool disks : {false, true}) {
+        SCOPED_TRACE(disks ? "--disks" : "default");
+        const std::string path = Generate(count, disks ? "gen-600-disks.xml" : "gen-600.xml", "", disks);
+        auto result = LoadCollection({path});
+        EXPECT_TRUE(result.fWarnings.empty());
+        TMemoryNamespace& ns = *result.fNamespace;
+        EXPECT_EQ(ns.GetInstanceCount(), count);
 
-    size_t seen = 0;
-    const std::vector<std::string> dangling = DanglingReferences(ns, seen);
-    EXPECT_GT(seen, count / 20);
-    EXPECT_TRUE(dangling.empty()) << dangling.size() << " dangling, first: " << dangling.front();
+        size_t seen = 0;
+        const std::vector<std::string> dangling = DanglingReferences(ns, seen);
+        EXPECT_GT(seen, count / 20);
+        EXPECT_TRUE(dangling.empty()) << dangling.size() << " dangling, first: " << dangling.front();
 
-    // The mix holds every kind the generator writes, with typed values.
-    for (const char* cls : {"ORVSG_LinuxEventLogRecord", "ORVSG_PCIDevice", "ORVSG_LogEntryOfDevice"})
-        EXPECT_FALSE(Instances(ns, cls).empty()) << cls;
-    const auto device = Instances(ns, "ORVSG_PCIDevice").front();
-    EXPECT_EQ(device->GetProperty("InstallDate", TCIMContext())->GetType(TCIMContext()), TType::eDateTime);
-    EXPECT_TRUE(device->GetProperty("IOAddress", TCIMContext())->IsArray(TCIMContext()));
-    EXPECT_EQ(device->GetProperty("PowerManagementSupported", TCIMContext())->GetType(TCIMContext()),
-              TType::eBoolean);
+        // The mix holds every kind the generator writes, with typed values.
+        const std::vector<const char*> kinds =
+            disks ? std::vector<const char*>{"ORVSG_LinuxEventLogRecord", "ORVSG_OperatingSystem",
+                                             "ORVSG_MediaAccessDevice", "ORVSG_DiskPartition", "ORVSG_LogicalDisk",
+                                             "ORVSG_PartitionPresent", "ORVSG_LogicalDiskBasedOnPartition"}
+                  : std::vector<const char*>{"ORVSG_LinuxEventLogRecord", "ORVSG_PCIDevice", "ORVSG_LogEntryOfDevice"};
+        for (const char* cls : kinds) EXPECT_FALSE(Instances(ns, cls).empty()) << cls;
+        if (disks) {
+            // Every disk reaches the file system on it through its partition.
+            for (const auto& disk : Instances(ns, "ORVSG_MediaAccessDevice")) {
+                std::vector<boost::shared_ptr<NORVTKR20::ICIMInstance>> parts, volumes;
+                disk->EnumerateAssociatedInstances(NORVTKR20::TAddToVectorCallback<NORVTKR20::ICIMInstance>(parts),
+                                                   "ORVSG_PartitionPresent", "", "", "", TCIMContext());
+                ASSERT_EQ(1u, parts.size()) << Text(disk, "DeviceID");
+                parts[0]->EnumerateAssociatedInstances(
+                    NORVTKR20::TAddToVectorCallback<NORVTKR20::ICIMInstance>(volumes),
+                    "ORVSG_LogicalDiskBasedOnPartition", "ORVSG_LogicalDisk", "", "", TCIMContext());
+                ASSERT_EQ(1u, volumes.size()) << Text(disk, "DeviceID");
+                EXPECT_FALSE(Text(volumes[0], "FileSystemName").empty());
+            }
+            continue;
+        }
+        const auto device = Instances(ns, "ORVSG_PCIDevice").front();
+        EXPECT_EQ(device->GetProperty("InstallDate", TCIMContext())->GetType(TCIMContext()), TType::eDateTime);
+        EXPECT_TRUE(device->GetProperty("IOAddress", TCIMContext())->IsArray(TCIMContext()));
+        EXPECT_EQ(device->GetProperty("PowerManagementSupported", TCIMContext())->GetType(TCIMContext()),
+                  TType::eBoolean);
+    }
 }
 
 TEST(GeneratedCollection, OutputDependsOnlyOnCountAndSeed) {

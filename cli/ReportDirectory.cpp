@@ -7,6 +7,7 @@
 #include <cstring>
 #include <filesystem>
 #include <fstream>
+#include <set>
 #include <stdexcept>
 
 #include <fcntl.h>
@@ -15,11 +16,14 @@
 #include <unistd.h>
 
 #include "CollectionLoader.h"
+#include "repository/CIMXMLReader.h"
 
 namespace fs = std::filesystem;
 
 namespace braigrion {
 namespace cli {
+
+using repository::ShownFileName;
 
 const char* const TReportDirectory::kMarkerName = ".braigrion-report";
 
@@ -74,41 +78,176 @@ std::string WorkPrefix(const fs::path& target) {
     return "." + target.filename().string() + ".braigrion-";
 }
 
-// Removes work directories of earlier runs whose process is gone.
+// True for the name mkdtemp gave a work directory of `target`: the prefix,
+// a process id, '-' and six letters or digits.
+bool IsWorkName(const std::string& name, const std::string& prefix, long& pid) {
+    if (name.compare(0, prefix.size(), prefix) != 0) return false;
+    const char* digits = name.c_str() + prefix.size();
+    char* end = nullptr;
+    pid = std::strtol(digits, &end, 10);
+    if (end == digits || pid <= 0 || *end != '-') return false;
+    const std::string suffix(end + 1);
+    if (suffix.size() != 6) return false;
+    for (char c : suffix)
+        if (!std::isalnum(static_cast<unsigned char>(c))) return false;
+    return true;
+}
+
+// Removes work directories of earlier runs whose process is gone. Only real
+// directories named as this program names them: never a file or a link.
 void RemoveStaleWork(const fs::path& target) {
     std::string prefix = WorkPrefix(target);
     std::error_code ec;
     for (const fs::directory_entry& entry : fs::directory_iterator(target.parent_path(), ec)) {
         std::string name = entry.path().filename().string();
-        if (name.compare(0, prefix.size(), prefix) != 0) continue;
-        long pid = std::strtol(name.c_str() + prefix.size(), nullptr, 10);
-        if (pid <= 0 || pid == static_cast<long>(getpid())) continue;
+        long pid = 0;
+        if (!IsWorkName(name, prefix, pid) || pid == static_cast<long>(getpid())) continue;
+        struct stat st;
+        if (::lstat(entry.path().c_str(), &st) != 0 || !S_ISDIR(st.st_mode)) continue;
         if (kill(static_cast<pid_t>(pid), 0) == 0 || errno != ESRCH) continue;
         std::error_code ignored;
         fs::remove_all(entry.path(), ignored);
     }
 }
 
+const char kMarkerFirstLine[] = "braigrion report";
+
+// A path that names a file inside the report: relative, without empty, "."
+// or ".." steps.
+bool IsInsidePath(const std::string& rel) {
+    if (rel.empty() || rel[0] == '/') return false;
+    size_t start = 0;
+    while (start <= rel.size()) {
+        size_t end = rel.find('/', start);
+        if (end == std::string::npos) end = rel.size();
+        const std::string step = rel.substr(start, end - start);
+        if (step.empty() || step == "." || step == "..") return false;
+        start = end + 1;
+    }
+    return true;
+}
+
+// Reads the marker of `dir`: false when there is none or it is not one this
+// program wrote (an empty file, say); otherwise the files it lists.
+bool ReadMarker(const fs::path& dir, std::set<std::string>& files) {
+    const fs::path marker = dir / TReportDirectory::kMarkerName;
+    struct stat st;
+    if (::lstat(marker.c_str(), &st) != 0 || !S_ISREG(st.st_mode)) return false;
+    std::ifstream in(marker.string());
+    std::string line;
+    if (!std::getline(in, line) || line != kMarkerFirstLine) return false;
+    while (std::getline(in, line)) {
+        if (line.compare(0, 7, "format ") == 0) continue;
+        if (line.compare(0, 5, "file ") != 0 || !IsInsidePath(line.substr(5))) return false;
+        files.insert(line.substr(5));
+    }
+    return true;
+}
+
+// The files under `dir` (links count as files), relative, sorted, the marker left out.
+std::vector<std::string> FilesUnder(const fs::path& dir) {
+    std::vector<std::string> files;
+    for (const fs::directory_entry& entry : fs::recursive_directory_iterator(dir)) {
+        if (entry.is_directory() && !entry.is_symlink()) continue;
+        const std::string rel = entry.path().lexically_relative(dir).string();
+        if (rel != TReportDirectory::kMarkerName) files.push_back(rel);
+    }
+    std::sort(files.begin(), files.end());
+    return files;
+}
+
+// True when everything in `dir` is the marker, a listed file, or a directory
+// on the way to one: a directory that only an earlier report fills.
+bool OnlyReportFiles(const fs::path& dir, const std::set<std::string>& listed) {
+    std::set<std::string> ways;
+    for (const std::string& file : listed) {
+        for (size_t slash = file.find('/'); slash != std::string::npos; slash = file.find('/', slash + 1))
+            ways.insert(file.substr(0, slash));
+    }
+    std::error_code ec;
+    for (fs::recursive_directory_iterator it(dir, ec), end; !ec && it != end; it.increment(ec)) {
+        const std::string rel = it->path().lexically_relative(dir).string();
+        if (rel == TReportDirectory::kMarkerName) continue;
+        const bool isDirectory = it->is_directory() && !it->is_symlink();
+        if (isDirectory ? ways.count(rel) == 0 : listed.count(rel) == 0) return false;
+    }
+    return !ec;
+}
+
 }  // namespace
+
+void TReportDirectory::MoveInAmong(const std::vector<std::string>& files) {
+    const fs::path target(fTarget), work(fWork);
+    std::set<std::string> earlier;
+    ReadMarker(target, earlier);
+    const std::set<std::string> now(files.begin(), files.end());
+    // First make sure that nothing of someone else's would be replaced, and
+    // that no directory on the way is a link leading out of the target.
+    for (const std::string& file : files) {
+        std::string way;
+        for (size_t slash = file.find('/'); slash != std::string::npos; slash = file.find('/', slash + 1)) {
+            way = file.substr(0, slash);
+            struct stat st;
+            if (::lstat((target / way).c_str(), &st) == 0 && !S_ISDIR(st.st_mode)) {
+                throw std::runtime_error(ShownFileName(fTarget) + ": holds " + ShownFileName(way) +
+                                         " where the report puts a directory; nothing was replaced");
+            }
+        }
+        struct stat st;
+        if (::lstat((target / file).c_str(), &st) == 0 && (earlier.count(file) == 0 || S_ISDIR(st.st_mode))) {
+            throw std::runtime_error(ShownFileName(fTarget) + ": holds " + ShownFileName(file) +
+                                     ", which the report did not write; nothing was replaced");
+        }
+    }
+    struct stat marker;
+    if (::lstat((target / kMarkerName).c_str(), &marker) == 0 && S_ISDIR(marker.st_mode)) {
+        throw std::runtime_error(ShownFileName(fTarget) + ": holds a directory " + kMarkerName +
+                                 " where the report puts its marker; nothing was replaced");
+    }
+    // The files of the earlier report that this one does not write go.
+    for (const std::string& file : earlier) {
+        struct stat st;
+        if (now.count(file) || ::lstat((target / file).c_str(), &st) != 0) continue;
+        if (S_ISREG(st.st_mode) || S_ISLNK(st.st_mode)) ::unlink((target / file).c_str());
+    }
+    for (const std::string& file : files) {
+        fs::create_directories((target / file).parent_path());
+        if (::rename((work / file).c_str(), (target / file).c_str()) != 0) {
+            throw std::runtime_error(ShownFileName(fTarget) + ": cannot put " + ShownFileName(file) +
+                                     " in place: " + Errno());
+        }
+    }
+    // The marker last: until it stands, the directory is no complete report.
+    if (::rename((work / kMarkerName).c_str(), (target / kMarkerName).c_str()) != 0) {
+        throw std::runtime_error(ShownFileName(fTarget) + ": cannot put the report marker in place: " + Errno());
+    }
+    fCommitted = true;
+    std::error_code ignored;
+    fs::remove_all(work, ignored);
+}
 
 TReportDirectory::TReportDirectory(const std::string& target, bool force) : fCommitted(false) {
     if (target.empty()) throw TInputError("no output directory given");
+    const std::string shown = ShownFileName(target);
     fs::path path = fs::absolute(fs::path(target)).lexically_normal();
     if (path.filename().empty()) path = path.parent_path();  // a trailing "/"
-    if (path == path.root_path()) throw TInputError(target + ": cannot write a report over the root directory");
+    if (path == path.root_path()) throw TInputError(shown + ": cannot write a report over the root directory");
     fTarget = path.string();
 
     struct stat st;
     if (::lstat(fTarget.c_str(), &st) == 0) {
-        if (!S_ISDIR(st.st_mode)) throw TInputError(target + ": exists and is not a directory");
+        if (!S_ISDIR(st.st_mode)) throw TInputError(shown + ": exists and is not a directory");
         std::error_code ec;
         bool empty = fs::is_empty(path, ec);
-        bool report = fs::exists(path / kMarkerName, ec);
+        std::set<std::string> listed;
+        bool report = ReadMarker(path, listed);
         if (!empty && !report && !force) {
-            throw TInputError(target + ": exists and is not a braigrion report; use --force to replace it");
+            throw TInputError(shown +
+                              ": exists and is not a braigrion report; use --force to write the report among its "
+                              "files (none of them is removed or replaced)");
         }
     } else if (errno != ENOENT) {
-        throw std::runtime_error(target + ": " + Errno());
+        throw std::runtime_error(shown + ": " + Errno());
     }
 
     RemoveStaleWork(path);
@@ -116,7 +255,7 @@ TReportDirectory::TReportDirectory(const std::string& target, bool force) : fCom
     std::vector<char> buffer(pattern.begin(), pattern.end());
     buffer.push_back('\0');
     if (::mkdtemp(buffer.data()) == nullptr) {
-        throw std::runtime_error(target + ": cannot create the report beside it: " + Errno());
+        throw std::runtime_error(shown + ": cannot create the report beside it: " + Errno());
     }
     fWork = buffer.data();
     ::chmod(fWork.c_str(), 0755);  // mkdtemp makes it private; a report is not
@@ -132,9 +271,11 @@ TReportDirectory::~TReportDirectory() {
 }
 
 void TReportDirectory::Commit(const std::string& format) {
+    const std::vector<std::string> files = FilesUnder(fWork);
     {
         std::ofstream marker((fs::path(fWork) / kMarkerName).string());
-        marker << "braigrion report\nformat " << format << "\n";
+        marker << kMarkerFirstLine << "\nformat " << format << "\n";
+        for (const std::string& file : files) marker << "file " << file << "\n";
         if (!marker) throw std::runtime_error(fWork + ": cannot write the report marker");
     }
     if (::rename(fWork.c_str(), fTarget.c_str()) == 0) {
@@ -142,27 +283,23 @@ void TReportDirectory::Commit(const std::string& format) {
         return;
     }
     if (errno != EEXIST && errno != ENOTEMPTY) {
-        throw std::runtime_error(fTarget + ": cannot put the report in place: " + Errno());
+        throw std::runtime_error(ShownFileName(fTarget) + ": cannot put the report in place: " + Errno());
     }
-    // An earlier report stands there: swap the two in one step, then
-    // remove the earlier one from the work directory's name.
+    std::set<std::string> earlier;
+    if (!ReadMarker(fTarget, earlier) || !OnlyReportFiles(fTarget, earlier)) {
+        // Files of someone else's stand there: they stay.
+        MoveInAmong(files);
+        return;
+    }
+    // An earlier report, and nothing else, stands there: swap the two in one
+    // step, then remove the earlier one from the work directory's name.
     if (::renameat2(AT_FDCWD, fWork.c_str(), AT_FDCWD, fTarget.c_str(), RENAME_EXCHANGE) != 0) {
         if (errno != EINVAL && errno != ENOSYS) {
-            throw std::runtime_error(fTarget + ": cannot put the report in place: " + Errno());
+            throw std::runtime_error(ShownFileName(fTarget) + ": cannot put the report in place: " + Errno());
         }
-        // A file system without exchange: two renames, the earlier report
-        // under a name of its own in between.
-        std::string old = fWork + "-old";
-        if (::rename(fTarget.c_str(), old.c_str()) != 0) {
-            throw std::runtime_error(fTarget + ": cannot move the earlier report aside: " + Errno());
-        }
-        if (::rename(fWork.c_str(), fTarget.c_str()) != 0) {
-            int error = errno;
-            ::rename(old.c_str(), fTarget.c_str());
-            errno = error;
-            throw std::runtime_error(fTarget + ": cannot put the report in place: " + Errno());
-        }
-        ::rename(old.c_str(), fWork.c_str());
+        // A file system without exchange: the files one by one.
+        MoveInAmong(files);
+        return;
     }
     fCommitted = true;
     std::error_code ignored;

@@ -2,6 +2,9 @@
 
 #include <CLI/CLI.hpp>
 
+#include <cerrno>
+#include <cstring>
+
 #include "CollectionLoader.h"
 #include "braigrion/TWriter.h"
 #include "tkrcore/TRootObject.h"
@@ -71,7 +74,12 @@ TContextMap MakeContext(const TRunOptions& options) {
 void SetUpLog(const TRunOptions& options) {
     NORVTKR20::TCoreLogger& log = NORVTKR20::TRootObject::GetDefaultLogger();
     if (!options.fLogFile.empty()) {
-        if (!log.SetLogFile(options.fLogFile)) throw TInputError(options.fLogFile + ": cannot open the log file");
+        errno = 0;
+        if (!log.SetLogFile(options.fLogFile)) {
+            const int error = errno;
+            throw TInputError(repository::ShownFileName(options.fLogFile) + ": cannot open the log file" +
+                              (error ? std::string(": ") + std::strerror(error) : std::string()));
+        }
         log.SetLevel(options.fLogLevel < 0 ? 0 : options.fLogLevel);
     } else {
         log.SetLogToStderr();

@@ -29,7 +29,8 @@ int main(int argc, char** argv) {
 
     // CLI11 would call an unknown word a missing subcommand; name it instead.
     if (argc > 1 && argv[1][0] != '-' && app.get_subcommands([&](CLI::App* sub) { return sub->get_name() == argv[1]; }).empty()) {
-        std::cerr << "braigrion: unknown command '" << argv[1] << "' (see braigrion --help)\n";
+        std::cerr << "braigrion: unknown command '" << braigrion::repository::PrintableText(argv[1])
+                  << "' (see braigrion --help)\n";
         return 2;
     }
     try {
@@ -41,7 +42,7 @@ int main(int argc, char** argv) {
     } catch (const CLI::CallForVersion& e) {
         return app.exit(e);
     } catch (const CLI::ParseError& e) {
-        std::cerr << "braigrion: " << e.what() << " (see braigrion --help)\n";
+        std::cerr << "braigrion: " << braigrion::repository::PrintableText(e.what()) << " (see braigrion --help)\n";
         return 2;
     }
 
@@ -50,10 +51,11 @@ int main(int argc, char** argv) {
         if (*reportCmd) return braigrion::cli::RunReport(report, std::cout, std::cerr, isatty(STDERR_FILENO) != 0);
         if (*pageCmd) return braigrion::cli::RunPage(page, std::cout, std::cerr);
     } catch (const braigrion::cli::TInputError& e) {
-        std::cerr << "braigrion: " << e.what() << '\n';
+        // One line, whatever names and values the message carries.
+        std::cerr << "braigrion: " << braigrion::repository::PrintableText(e.what()) << '\n';
         return 2;
     } catch (const std::exception& e) {
-        std::cerr << "braigrion: " << e.what() << '\n';
+        std::cerr << "braigrion: " << braigrion::repository::PrintableText(e.what()) << '\n';
         return 1;
     }
     return 1;

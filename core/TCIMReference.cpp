@@ -75,6 +75,8 @@ TCIMReference::TCIMReference(boost::shared_ptr<ICIMNamespace> ns, std::map<std::
 
 void TCIMReference::AddKeyValue(const std::string& name, const TCIMValue& value) { fKeys[name] = value; }
 
+void TCIMReference::AddKeyValue(const std::string& name, TCIMValue&& value) { fKeys[name] = std::move(value); }
+
 void TCIMReference::EnumerateKeyBindings(
     boost::function<bool(std::pair<std::string, TCIMValue>)> const& callback) const {
     for (const auto& kv : fKeys) {

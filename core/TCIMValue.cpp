@@ -138,6 +138,18 @@ std::string FormatReal(double v, bool single) {
 
 [[noreturn]] void Fail(int status) { throw TTKRException(status); }
 
+// One character of UTF-8: a lead byte and as many continuation bytes as it
+// announces.
+bool IsOneCharacter(const std::string& text) {
+    if (text.empty()) return false;
+    const unsigned char lead = static_cast<unsigned char>(text[0]);
+    const size_t length = lead < 0x80 ? 1 : lead >= 0xF0 ? 4 : lead >= 0xE0 ? 3 : lead >= 0xC0 ? 2 : 0;
+    if (length != text.size()) return false;
+    for (size_t k = 1; k < length; ++k)
+        if ((static_cast<unsigned char>(text[k]) & 0xC0) != 0x80) return false;
+    return true;
+}
+
 }  // namespace
 
 const char* TCIMValue::TCIMType::GetName() const {
@@ -177,6 +189,12 @@ TCIMValue::TCIMValue(const TCIMReference& value)
     fNum.u = 0;
 }
 
+TCIMValue::TCIMValue(TCIMReference&& value)
+    : fType(TType::eReference), fIsArray(false), fIsNull(false),
+      fPayload(new THolder<TCIMReference>(std::move(value))) {
+    fNum.u = 0;
+}
+
 TCIMValue::TCIMValue(const TCIMValue& o)
     : fType(o.fType), fIsArray(o.fIsArray), fIsNull(o.fIsNull), fNum(o.fNum), fText(o.fText),
       fPayload(o.fPayload ? o.fPayload->Clone() : nullptr) {}
@@ -187,8 +205,14 @@ TCIMValue::TCIMValue(TCIMValue&& o) noexcept
 
 TCIMValue& TCIMValue::operator=(const TCIMValue& o) {
     if (this != &o) {
-        TCIMValue copy(o);
-        *this = std::move(copy);
+        // Copy the payload first: `o` may live inside this value's payload.
+        std::unique_ptr<TPayload> payload(o.fPayload ? o.fPayload->Clone() : nullptr);
+        fType = o.fType;
+        fIsArray = o.fIsArray;
+        fIsNull = o.fIsNull;
+        fNum = o.fNum;
+        fText = o.fText;
+        fPayload = std::move(payload);
     }
     return *this;
 }
@@ -306,6 +330,7 @@ TCIMValue TCIMValue::FromText(ECIMType type, const std::string& text) {
             return Real(type, d);
         }
         case TType::eChar16:
+            if (!IsOneCharacter(text)) Fail(kTypeMismatch);
             return Char16(text);
         case TType::eString:
             return TCIMValue(text);
@@ -322,6 +347,17 @@ TCIMValue TCIMValue::FromText(ECIMType type, const std::string& text) {
         default:
             Fail(kTypeMismatch);
     }
+}
+
+bool TCIMValue::ParseIntegerText(const std::string& text, bool& negative, std::uint64_t& magnitude) {
+    return ParseInteger(text, negative, magnitude);
+}
+
+bool TCIMValue::ParseRealText(const std::string& text, double& out) { return ParseReal(text, out); }
+
+const TCIMReference* TCIMValue::GetReference() const {
+    if (fIsNull || fIsArray || fType != TType::eReference || !fPayload) return nullptr;
+    return &Item<TCIMReference>(fPayload);
 }
 
 bool TCIMValue::operator==(const TCIMValue& o) const {

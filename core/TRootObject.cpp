@@ -9,7 +9,26 @@ TCoreLogger::TCoreLogger() : fThreshold(0) {}
 void TCoreLogger::Log(int level, const std::string& message) {
     if (level > fThreshold) return;
     std::ostream& out = fFile ? static_cast<std::ostream&>(*fFile) : std::cerr;
-    out << '[' << level << "] " << message << '\n';
+    // One line a message, whatever collected text it quotes.
+    std::string line;
+    line.reserve(message.size());
+    for (unsigned char c : message) {
+        if (c >= 0x20 && c != 0x7F) {
+            line += static_cast<char>(c);
+        } else if (c == '\n') {
+            line += "\\n";
+        } else if (c == '\r') {
+            line += "\\r";
+        } else if (c == '\t') {
+            line += "\\t";
+        } else {
+            static const char kHex[] = "0123456789abcdef";
+            line += "\\x";
+            line += kHex[c >> 4];
+            line += kHex[c & 15];
+        }
+    }
+    out << '[' << level << "] " << line << '\n';
     if (level == 0) out.flush();
 }
 

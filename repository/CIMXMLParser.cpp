@@ -1,5 +1,7 @@
 #include "repository/CIMXMLParser.h"
 
+#include "repository/CIMXMLReader.h"
+
 #include <algorithm>
 #include <cstdlib>
 #include <cstring>
@@ -31,11 +33,12 @@ const char* Attr(const char** atts, const char* name) {
 
 bool IsSpace(char c) { return c == ' ' || c == '\t' || c == '\n' || c == '\r'; }
 
-// A text for a message: quoted, and cut when long.
+// A text for a message: quoted, cut when long, control characters escaped
+// so that the message stays one line.
 std::string Quote(const std::string& text) {
     const size_t kMax = 60;
-    if (text.size() <= kMax) return '"' + text + '"';
-    return '"' + text.substr(0, kMax) + "...\"";
+    if (text.size() <= kMax) return '"' + PrintableText(text) + '"';
+    return '"' + PrintableText(text.substr(0, kMax)) + "...\"";
 }
 
 const char* TypeName(ECIMType type) { return TType(type).GetName(); }
@@ -394,10 +397,7 @@ void TParser::StartQualifierDeclaration(const char** atts) {
     fQualifierDecl.fType = RequireType(atts, "QUALIFIER.DECLARATION", name);
     fQualifierDecl.fIsArray = BoolAttr(atts, "ISARRAY", false);
     if (const char* size = Attr(atts, "ARRAYSIZE")) {
-        char* end = nullptr;
-        long n = std::strtol(size, &end, 10);
-        if (*size == '\0' || *end != '\0' || n < 0) FailHere("ARRAYSIZE " + Quote(size) + " is not a count");
-        fQualifierDecl.fArraySize = static_cast<int>(n);
+        fQualifierDecl.fArraySize = ArraySize(size);
         fQualifierDecl.fIsArray = true;
     }
     fQualifierDecl.fOverridable = BoolAttr(atts, "OVERRIDABLE", true);
@@ -498,18 +498,15 @@ void TParser::StartProperty(E kind, const char** atts) {
         fDecl.fName = name;
         fDecl.fType = type;
         fDecl.fIsArray = isArray;
-        if (const char* size = Attr(atts, "ARRAYSIZE")) {
-            char* end = nullptr;
-            long n = std::strtol(size, &end, 10);
-            if (*size == '\0' || *end != '\0' || n < 0) FailHere("ARRAYSIZE " + Quote(size) + " is not a count");
-            fDecl.fArraySize = static_cast<int>(n);
-        }
+        if (const char* size = Attr(atts, "ARRAYSIZE")) fDecl.fArraySize = ArraySize(size);
         if (referenceClass) fDecl.fReferenceClass = referenceClass;
         if (const char* origin = Attr(atts, "CLASSORIGIN")) fDecl.fClassOrigin = origin;
         fDecl.fPropagated = BoolAttr(atts, "PROPAGATED", false);
         fDecl.fEmbeddedObject = embedded != nullptr;
         fDecl.fDefault = TCIMValue::Null(type, isArray);
     } else {
+        // An instance keeps no array size, but a wrong one is still wrong.
+        if (const char* size = Attr(atts, "ARRAYSIZE")) ArraySize(size);
         fProperty.fName = name;
         fProperty.fType = type;
         fProperty.fIsArray = isArray;
@@ -591,6 +588,11 @@ void TParser::StartValue(E kind) {
             fArray.clear();
             break;
         case E::kVALUE_REFERENCE:
+            // Each level of a path whose key is a path doubles the escaping
+            // of its text; past a few levels it is no path a collector writes.
+            if (fPaths.size() >= kMaxReferenceDepth)
+                FailHere("VALUE.REFERENCE nested more than " + std::to_string(kMaxReferenceDepth) +
+                         " levels deep (a reference whose key is a reference)");
             fPaths.emplace_back();
             fPaths.back().fOffset = Here();
             break;
@@ -628,13 +630,13 @@ void TParser::EndValueReference() {
     fPaths.pop_back();
     if (path.fRef.GetClassName().empty()) Fail(Current().fOffset, "VALUE.REFERENCE holds no object path");
     path.fRef.SetNamespace(fNamespace);
-    TCIMValue value(path.fRef);
+    TCIMValue value(std::move(path.fRef));
     const E parent = fStack[fStack.size() - 2].fKind;
     if (parent == E::kPROPERTY_REFERENCE) {
         *TargetFor(parent).fDest = std::move(value);
     } else {
         TPath& outer = TopPath();
-        outer.fRef.AddKeyValue(parent == E::kKEYBINDING ? outer.fKeyName : std::string(), value);
+        outer.fRef.AddKeyValue(parent == E::kKEYBINDING ? outer.fKeyName : std::string(), std::move(value));
     }
 }
 
@@ -642,7 +644,7 @@ TCIMValue TParser::Convert(ECIMType type, const std::string& text, const char* e
                            const std::string& name, std::int64_t offset) {
     // Some servers write an absent value as an empty VALUE: for a type that
     // no empty text can spell, that is a null.
-    if (text.empty() && type != TType::eString && type != TType::eChar16) return TCIMValue::Null(type);
+    if (text.empty() && type != TType::eString) return TCIMValue::Null(type);
     // The common plain forms are read here; everything else (hex, binary,
     // white space, errors) goes the general way.
     switch (type) {
@@ -770,7 +772,7 @@ void TParser::EndKeyValue() {
             }
         }
     }
-    path.fRef.AddKeyValue(key, value);
+    path.fRef.AddKeyValue(key, std::move(value));
 }
 
 void TParser::EndPathElement(E kind) {
@@ -826,6 +828,20 @@ ECIMType TParser::RequireType(const char** atts, const char* element, const char
     return out;
 }
 
+int TParser::ArraySize(const char* text) {
+    // Digits only, and a count that an int holds: no sign, no blanks, no
+    // number too large to mean anything.
+    const size_t n = std::strlen(text);
+    bool digits = n > 0 && n <= 10;
+    long long value = 0;
+    for (size_t k = 0; digits && k < n; ++k) {
+        digits = text[k] >= '0' && text[k] <= '9';
+        value = value * 10 + (text[k] - '0');
+    }
+    if (!digits || value > 0x7FFFFFFF) FailHere("ARRAYSIZE " + Quote(text) + " is not a count");
+    return static_cast<int>(value);
+}
+
 bool TParser::BoolAttr(const char** atts, const char* attr, bool fallback) {
     const char* value = Attr(atts, attr);
     if (!value) return fallback;
@@ -840,19 +856,20 @@ bool TParser::BoolAttr(const char** atts, const char* attr, bool fallback) {
 const std::string& TParser::TakeText() {
     const size_t n = fText.size();
     if (n == 0 || (!IsSpace(fText[0]) && !IsSpace(fText[n - 1]))) return fText;
-    auto isProtected = [this](size_t pos) {
-        return std::find(fProtected.begin(), fProtected.end(), pos) != fProtected.end();
-    };
+    // fProtected is in ascending order: the layout at the start ends at the
+    // first protected position, the layout at the end begins after the last.
+    const size_t firstProtected = fProtected.empty() ? n : fProtected.front();
+    const size_t lastProtected = fProtected.empty() ? 0 : fProtected.back();
     size_t begin = 0;
     bool lineBreak = false;
-    while (begin < n && IsSpace(fText[begin]) && !isProtected(begin)) {
+    while (begin < n && begin < firstProtected && IsSpace(fText[begin])) {
         lineBreak = lineBreak || fText[begin] == '\n' || fText[begin] == '\r';
         ++begin;
     }
     if (!lineBreak) begin = 0;
     size_t end = n;
     lineBreak = false;
-    while (end > begin && IsSpace(fText[end - 1]) && !isProtected(end - 1)) {
+    while (end > begin && IsSpace(fText[end - 1]) && (fProtected.empty() || end - 1 > lastProtected)) {
         lineBreak = lineBreak || fText[end - 1] == '\n' || fText[end - 1] == '\r';
         --end;
     }

@@ -44,6 +44,9 @@ struct TParseFailure {
 
 class TParser {
 public:
+    // How deep references may nest inside the key bindings of references.
+    static const size_t kMaxReferenceDepth = 8;
+
     // References read are bound to `ns` so that they resolve in the collection
     // they are loaded into. Warnings are "LINE: text"; the caller adds the file.
     TParser(TSink& sink, const boost::shared_ptr<NORVTKR20::ICIMNamespace>& ns);
@@ -127,6 +130,7 @@ private:
                       const std::string& name, std::int64_t offset);
     ECIMType RequireType(const char** atts, const char* element, const char* name);
     bool BoolAttr(const char** atts, const char* attr, bool fallback);
+    int ArraySize(const char* text);
     const std::string& TakeText();
     TPath& TopPath();
     [[noreturn]] void Fail(std::int64_t offset, std::string message);

@@ -15,8 +15,53 @@ using cimxml::TParseFailure;
 using cimxml::TParser;
 using cimxml::TSink;
 
+std::string PrintableText(const std::string& text) {
+    std::string out;
+    out.reserve(text.size());
+    for (unsigned char c : text) {
+        if (c >= 0x20 && c != 0x7F) {
+            out += static_cast<char>(c);
+            continue;
+        }
+        switch (c) {
+            case '\n': out += "\\n"; break;
+            case '\r': out += "\\r"; break;
+            case '\t': out += "\\t"; break;
+            default: {
+                static const char kHex[] = "0123456789abcdef";
+                out += "\\x";
+                out += kHex[c >> 4];
+                out += kHex[c & 15];
+            }
+        }
+    }
+    return out;
+}
+
+std::string ShownFileName(const std::string& name) {
+    bool plain = !name.empty();
+    for (unsigned char c : name) plain = plain && c >= 0x20 && c != 0x7F && c != '"';
+    if (plain) return name;
+    std::string out = "\"";
+    for (char c : PrintableText(name)) {
+        if (c == '"') out += '\\';
+        out += c;
+    }
+    return out + '"';
+}
+
+namespace {
+
+std::string LoadErrorText(const std::string& file, unsigned line, unsigned column, const std::string& message) {
+    std::string out = ShownFileName(file) + ":";
+    if (line > 0) out += std::to_string(line) + ":" + std::to_string(column) + ":";
+    return out + " " + PrintableText(message);
+}
+
+}  // namespace
+
 TLoadError::TLoadError(std::string file, unsigned line, unsigned column, std::string message)
-    : std::runtime_error(file + ":" + std::to_string(line) + ":" + std::to_string(column) + ": " + message),
+    : std::runtime_error(LoadErrorText(file, line, column, message)),
       fFile(std::move(file)),
       fLine(line),
       fColumn(column),
@@ -199,7 +244,8 @@ void Parse(const TSource& source, TSink& sink, const boost::shared_ptr<TMemoryNa
     }
     if (parser.Failure().fFailed) throw source.ErrorFor(parser.Failure());
     for (const auto& warning : parser.Warnings())
-        warnings.push_back(source.fName + ":" + std::to_string(warning.first) + ": " + warning.second);
+        warnings.push_back(ShownFileName(source.fName) + ":" + std::to_string(warning.first) + ": " +
+                           PrintableText(warning.second));
 }
 
 TSource FileSource(const std::string& file) {

@@ -13,8 +13,11 @@
 namespace braigrion {
 namespace repository {
 
-// A file that cannot be loaded. what() is "FILE:LINE:COLUMN: MESSAGE";
-// line and column count from 1, a column in characters.
+// A file that cannot be loaded. what() is "FILE:LINE:COLUMN: MESSAGE", or
+// "FILE: MESSAGE" when the failure has no position in the file (line 0);
+// line and column count from 1, a column in characters. what() is always one
+// line: the file name and message are shown as PrintableText/ShownFileName
+// make them; File() and Message() keep them as they were.
 class TLoadError : public std::runtime_error {
 public:
     TLoadError(std::string file, unsigned line, unsigned column, std::string message);
@@ -30,6 +33,13 @@ private:
     unsigned fColumn;
     std::string fMessage;
 };
+
+// The text with every control character written as an escape (\n, \t,
+// \x1b...), so that a message made of collected values stays one line.
+std::string PrintableText(const std::string& text);
+// A file name for a message: as it is, or quoted and escaped when it holds a
+// control character or a '"', or is empty.
+std::string ShownFileName(const std::string& name);
 
 struct TLoadResult {
     boost::shared_ptr<TMemoryNamespace> fNamespace;

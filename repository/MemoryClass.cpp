@@ -189,24 +189,31 @@ void TMemoryClass::Compact() {
 // Indices are read afresh on each step, so a callback that adds instances
 // does not invalidate the walk; instances added during the walk are not
 // visited. Deleted instances are dropped from the list only when no walk of
-// this class is under way.
+// this class is under way. Subclasses are walked depth first in declaration
+// order, from a list rather than by recursion, so that a long chain of
+// subclasses takes no stack.
 bool TMemoryClass::Walk(const NORVTKR20::TInstanceCallback& callback, bool deep) {
-    if (fWalking == 0) Compact();
-    ++fWalking;
+    std::vector<TMemoryClass*> pending(1, this);
+    std::vector<TMemoryClass*> walking;
     struct TGuard {
-        unsigned& fCount;
-        ~TGuard() { --fCount; }
-    } guard{fWalking};
-    const size_t n = fInstances.size();
-    for (size_t i = 0; i < n; ++i) {
-        boost::shared_ptr<TMemoryInstance> inst = fInstances[i];
-        if (inst->IsDeleted()) continue;
-        if (!callback(inst)) return false;
-    }
-    if (deep) {
-        std::vector<TMemoryClass*> subs = fSubClasses;
-        for (TMemoryClass* sub : subs)
-            if (!sub->Walk(callback, true)) return false;
+        std::vector<TMemoryClass*>& fClasses;
+        ~TGuard() {
+            for (TMemoryClass* c : fClasses) --c->fWalking;
+        }
+    } guard{walking};
+    while (!pending.empty()) {
+        TMemoryClass* cls = pending.back();
+        pending.pop_back();
+        if (cls->fWalking == 0) cls->Compact();
+        ++cls->fWalking;
+        walking.push_back(cls);
+        const size_t n = cls->fInstances.size();
+        for (size_t i = 0; i < n; ++i) {
+            boost::shared_ptr<TMemoryInstance> inst = cls->fInstances[i];
+            if (inst->IsDeleted()) continue;
+            if (!callback(inst)) return false;
+        }
+        if (deep) pending.insert(pending.end(), cls->fSubClasses.rbegin(), cls->fSubClasses.rend());
     }
     return true;
 }
@@ -220,14 +227,14 @@ void TMemoryClass::EnumerateSubClasses(const NORVTKR20::TClassCallback& callback
     fNamespace.Link();
     if (!callback) return;
     boost::shared_ptr<TMemoryNamespace> owner = fNamespace.Self();
-    std::function<bool(TMemoryClass&)> walk = [&](TMemoryClass& cls) {
-        for (TMemoryClass* sub : cls.fSubClasses) {
-            if (!callback(boost::shared_ptr<NORVTKR20::ICIMClass>(owner, sub))) return false;
-            if (deep && !walk(*sub)) return false;
-        }
-        return true;
-    };
-    walk(*this);
+    // Depth first in declaration order, from a list rather than by recursion.
+    std::vector<TMemoryClass*> pending(fSubClasses.rbegin(), fSubClasses.rend());
+    while (!pending.empty()) {
+        TMemoryClass* sub = pending.back();
+        pending.pop_back();
+        if (!callback(boost::shared_ptr<NORVTKR20::ICIMClass>(owner, sub))) return;
+        if (deep) pending.insert(pending.end(), sub->fSubClasses.rbegin(), sub->fSubClasses.rend());
+    }
 }
 
 void TMemoryClass::EnumerateAssociatorClasses(const NORVTKR20::TInstanceCallback& callback, bool deep,

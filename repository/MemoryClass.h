@@ -92,6 +92,9 @@ public:
     // The live instances of this class alone, in the order they were added.
     std::vector<boost::shared_ptr<TMemoryInstance>> GetInstances() const;
     size_t GetInstanceCount() const { return fLiveCount; }
+    // The instances of this class alone without a copy, deleted ones that
+    // are not yet compacted included (test IsDeleted()).
+    const std::vector<boost::shared_ptr<TMemoryInstance>>& GetInstanceList() const { return fInstances; }
     TMemoryNamespace& GetNamespace() const { return fNamespace; }
 
 private:

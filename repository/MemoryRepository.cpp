@@ -180,30 +180,51 @@ std::vector<TQualifierData> MergeQualifiers(const std::vector<TQualifierData>& o
 
 void TMemoryNamespace::Link() {
     if (fLinked) return;
-    // Superclasses; a cycle or an unknown superclass leaves a class at the root.
-    for (auto& c : fClasses) {
-        c->fSuper = nullptr;
-        c->fSubClasses.clear();
+    // Superclasses; a cycle or an unknown superclass leaves a class at the
+    // root. Classes take their superclass in declaration order, and the one
+    // whose superclass would close a cycle stays at the root. The top of each
+    // chain is kept in a union-find, so that the cycle check costs nearly
+    // nothing per class however long the chains are.
+    const size_t count = fClasses.size();
+    std::unordered_map<const TMemoryClass*, size_t> indexOf;
+    indexOf.reserve(count);
+    std::vector<size_t> top(count);
+    for (size_t i = 0; i < count; ++i) {
+        fClasses[i]->fSuper = nullptr;
+        fClasses[i]->fSubClasses.clear();
+        indexOf.emplace(fClasses[i].get(), i);
+        top[i] = i;
     }
-    for (auto& c : fClasses) {
+    auto topOf = [&top](size_t x) {
+        size_t r = x;
+        while (top[r] != r) r = top[r];
+        while (top[x] != r) {
+            const size_t next = top[x];
+            top[x] = r;
+            x = next;
+        }
+        return r;
+    };
+    for (size_t i = 0; i < count; ++i) {
+        TMemoryClass* c = fClasses[i].get();
         if (!c->fDeclared || c->fDeclaration.fSuperClass.empty()) continue;
         TMemoryClass* super = FindClass(c->fDeclaration.fSuperClass);
-        for (TMemoryClass* up = super; up; up = up->fSuper) {
-            if (up == c.get()) {
-                super = nullptr;
-                break;
-            }
-        }
+        if (!super) continue;
+        const size_t s = indexOf[super];
+        if (topOf(s) == i) continue;  // the superclass descends from this class
         c->fSuper = super;
-        if (super) super->fSubClasses.push_back(c.get());
+        super->fSubClasses.push_back(c);
+        top[i] = s;
     }
-    // Effective properties, superclasses first.
-    std::unordered_set<TMemoryClass*> done;
-    std::function<void(TMemoryClass*)> linkOne = [&](TMemoryClass* cls) {
-        if (done.count(cls)) return;
-        if (cls->fSuper) linkOne(cls->fSuper);
-        done.insert(cls);
-
+    // Effective properties, superclasses first: roots in declaration order,
+    // then their subclasses level by level.
+    std::vector<TMemoryClass*> order;
+    order.reserve(count);
+    for (auto& c : fClasses)
+        if (!c->fSuper) order.push_back(c.get());
+    for (size_t k = 0; k < order.size(); ++k)
+        order.insert(order.end(), order[k]->fSubClasses.begin(), order[k]->fSubClasses.end());
+    auto linkOne = [&](TMemoryClass* cls) {
         std::vector<TPropertyDeclData> decls;
         std::vector<bool> inferred;
         auto findDecl = [&](const std::string& name) -> int {
@@ -289,7 +310,7 @@ void TMemoryNamespace::Link() {
         }
         cls->fKeyNames = keys;
     };
-    for (auto& c : fClasses) linkOne(c.get());
+    for (TMemoryClass* c : order) linkOne(c);
     fLinked = true;
     Invalidate();
 }

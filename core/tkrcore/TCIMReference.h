@@ -29,11 +29,14 @@ public:
     TCIMReference(boost::shared_ptr<ICIMNamespace> ns, std::map<std::string, TCIMValue> context);
     TCIMReference();
     TCIMReference(const TCIMReference&) = default;
+    TCIMReference(TCIMReference&&) noexcept = default;
     TCIMReference& operator=(const TCIMReference&) = default;
+    TCIMReference& operator=(TCIMReference&&) noexcept = default;
 
     const std::string& GetClassName() const { return fClassName; }
     void SetClassName(const std::string& name) { fClassName = name; }
     void AddKeyValue(const std::string& name, const TCIMValue& value);
+    void AddKeyValue(const std::string& name, TCIMValue&& value);
     // Walks the key bindings in name order; stops when the callback answers false.
     void EnumerateKeyBindings(
         boost::function<bool(std::pair<std::string, TCIMValue>)> const& callback) const;

@@ -56,6 +56,7 @@ public:
     TCIMValue(unsigned short value);
     TCIMValue(const TCIMDateTime& value);
     explicit TCIMValue(const TCIMReference& value);
+    explicit TCIMValue(TCIMReference&& value);
     TCIMValue(const TCIMValue& other);
     TCIMValue(TCIMValue&& other) noexcept;
     TCIMValue& operator=(const TCIMValue& other);
@@ -73,6 +74,11 @@ public:
     // Parses the text of a CIM-XML VALUE as the given type; throws
     // TTKRException(kTypeMismatch) or (kOutOfRange) when it does not fit.
     static TCIMValue FromText(TCIMType::ECIMType type, const std::string& text);
+    // The number parsers behind FromText, without exceptions: a CIM integer
+    // literal (decimal, 0x hex, binary with a trailing b; blanks around it
+    // allowed) as sign and magnitude, and a real.
+    static bool ParseIntegerText(const std::string& text, bool& negative, std::uint64_t& magnitude);
+    static bool ParseRealText(const std::string& text, double& out);
 
     bool operator==(const TCIMValue& other) const;
     bool operator!=(const TCIMValue& other) const { return !(*this == other); }
@@ -94,6 +100,8 @@ public:
     operator TCIMDateTime() const;
     operator TCIMReference() const;
     operator std::vector<TCIMValue>&() const;  // throws kTypeMismatch unless an array
+    // The path of a reference value, without a copy; null for anything else.
+    const TCIMReference* GetReference() const;
 
     std::int64_t AsSigned() const;
     std::uint64_t AsUnsigned() const;

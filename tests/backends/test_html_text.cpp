@@ -48,6 +48,9 @@ TEST(SanitizeCellMarkup, KeepsOnlyTheLogicsOwnTags) {
          "<font face=\"Courier\"><a href=\"x\">a&lt;/font&gt;</a></font>"},  // closers must nest
         {"<script>alert(1)</script> &lt;kept&gt;", "&lt;script&gt;alert(1)&lt;/script&gt; &lt;kept&gt;"},
         {"1 < 2 > 0", "1 &lt; 2 &gt; 0"},
+        {"<a href=\"java&#115;cript&#58;alert(6)\">x</a>",
+         "&lt;a href=&quot;java&#115;cript&#58;alert(6)&quot;&gt;x&lt;/a&gt;"},  // no link, and as text harmless
+        {"<a href=\"page&#46;html\">p</a>", "<a href=\"page.html\">p</a>"},
     };
     for (const auto& c : cases) EXPECT_EQ(c.out, SanitizeCellMarkup(c.in)) << c.in;
 }
@@ -72,6 +75,18 @@ TEST(SafeHref, AllowsReportFilesAndWebAddressesOnly) {
         {"a\"b", false, ""},
         {"a\nb", false, ""},
         {"", true, ""},
+        // Judged as the browser decodes the attribute, and handed back decoded.
+        {"java&#115;cript&#58;alert(6)", true, ""},
+        {"javascript&colon;alert(1)", true, ""},
+        {"&#106;avascript:alert(1)", false, ""},
+        {"&#x6A;avascript&#x3A;alert(1)", true, ""},
+        {"jav&#x09;ascript:alert(1)", true, ""},
+        {"jav&Tab;ascript:alert(1)", true, ""},
+        {"java&amp;#115;cript&amp;#58;alert(1)", false, ""},  // decoded, it still holds references
+        {"&#46;&#46;/up.html", false, ""},
+        {"&#47;abs", false, ""},
+        {"page&#46;html", false, "page.html"},
+        {"https://docs.example.com/a?b=1&amp;c=2", true, "https://docs.example.com/a?b=1&c=2"},
     };
     for (const auto& c : cases) EXPECT_EQ(c.out, SafeHref(c.link, c.web)) << c.link;
 }

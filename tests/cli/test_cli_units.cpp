@@ -31,7 +31,8 @@ protected:
         fDir = fs::path(::testing::TempDir()) / ("braigrion_dir_" + std::to_string(getpid()));
         fs::remove_all(fDir);
         fs::create_directories(fDir / "report");
-        std::ofstream((fDir / "report" / TReportDirectory::kMarkerName).string()) << "braigrion report\n";
+        std::ofstream((fDir / "report" / TReportDirectory::kMarkerName).string())
+            << "braigrion report\nformat html\nfile index.html\n";
         std::ofstream((fDir / "report" / "index.html").string()) << "earlier";
     }
     void TearDown() override { fs::remove_all(fDir); }
@@ -82,13 +83,19 @@ TEST_F(ReportDirectoryTest, AFailedOrInterruptedRunLeavesTheEarlierReport) {
     waitpid(dead, nullptr, 0);
     fs::create_directories(fDir / (".report.braigrion-" + std::to_string(dead) + "-abcdef"));
     fs::create_directories(fDir / (".report.braigrion-" + std::to_string(getppid()) + "-alive"));
+    // Only directories named as the program names them go: not a file, not a link.
+    std::ofstream((fDir / (".report.braigrion-" + std::to_string(dead) + "-notdir")).string()) << "mine";
+    fs::create_symlink(fDir / "report", fDir / (".report.braigrion-" + std::to_string(dead) + "-linked"));
     {
         TReportDirectory directory((fDir / "report").string(), false);
         std::ofstream(directory.WorkPath() + "/index.html") << "new";
         directory.Commit("html");
     }
-    EXPECT_EQ((std::vector<std::string>{".report.braigrion-" + std::to_string(getppid()) + "-alive", "report"}),
-              Entries())
+    std::vector<std::string> staying = {".report.braigrion-" + std::to_string(getppid()) + "-alive",
+                                        ".report.braigrion-" + std::to_string(dead) + "-linked",
+                                        ".report.braigrion-" + std::to_string(dead) + "-notdir", "report"};
+    std::sort(staying.begin(), staying.end());
+    EXPECT_EQ(staying, Entries())
         << "the work of a live process stays";
     EXPECT_EQ("new", Earlier());
     EXPECT_TRUE(fs::exists(fDir / "report" / TReportDirectory::kMarkerName));

@@ -9,6 +9,7 @@
 #include <cctype>
 #include <filesystem>
 #include <fstream>
+#include <functional>
 #include <regex>
 #include <sstream>
 
@@ -101,17 +102,22 @@ TEST_F(ReportCommand, WritesAnHtmlReportAndPrintsItsIndex) {
 }
 
 TEST_F(ReportCommand, ReplacesAnEarlierReportAndOnlyThat) {
-    // An earlier report is replaced whole.
+    // The files of an earlier report are replaced or removed; a file someone
+    // put beside them stays.
     ASSERT_EQ(0, RunBraigrion(Args({"report", "-o", Path("report")}, SampleFiles())).fStatus);
-    Write("report/stale.html", "from an earlier run");
+    Write("report/notes.txt", "mine");
     TCommandResult text = RunBraigrion(Args({"report", "--format", "text", "-o", Path("report")}, SampleFiles()));
     ASSERT_EQ(0, text.fStatus) << text.fErr;
     EXPECT_EQ(Path("report") + "/index.txt\n", text.fOut);
-    EXPECT_FALSE(fs::exists(Path("report/stale.html")));
     EXPECT_FALSE(fs::exists(Path("report/index.html")));
+    EXPECT_FALSE(fs::exists(Path("report/navbar.html")));
     EXPECT_TRUE(fs::exists(Path("report/index.txt")));
+    EXPECT_EQ("mine", Slurp(Path("report/notes.txt")));
+    ASSERT_EQ(0, RunBraigrion(Args({"report", "--format", "text", "-o", Path("report")}, SampleFiles())).fStatus);
+    EXPECT_EQ("mine", Slurp(Path("report/notes.txt")));
 
-    // A directory of something else is refused, untouched, unless forced.
+    // A directory of something else is refused, untouched; forced, the
+    // report goes among its files and none of them is removed.
     fs::create_directories(Path("photos"));
     Write("photos/holiday.jpg", "not a report");
     TCommandResult refused = RunBraigrion(Args({"report", "-o", Path("photos")}, SampleFiles()));
@@ -120,13 +126,138 @@ TEST_F(ReportCommand, ReplacesAnEarlierReportAndOnlyThat) {
     EXPECT_EQ("not a report", Slurp(Path("photos/holiday.jpg")));
     TCommandResult forced = RunBraigrion(Args({"report", "--force", "-o", Path("photos")}, SampleFiles()));
     EXPECT_EQ(0, forced.fStatus) << forced.fErr;
-    EXPECT_FALSE(fs::exists(Path("photos/holiday.jpg")));
+    EXPECT_EQ("not a report", Slurp(Path("photos/holiday.jpg")));
+    EXPECT_TRUE(fs::exists(Path("photos/index.html")));
 
     // An empty directory is taken as it is.
     fs::create_directories(Path("empty"));
     EXPECT_EQ(0, RunBraigrion(Args({"report", "-o", Path("empty/")}, SampleFiles())).fStatus);
     EXPECT_TRUE(fs::exists(Path("empty/index.html")));
     EXPECT_EQ((std::vector<std::string>{"empty", "photos", "report"}), Entries());
+}
+
+// Mark-up in what the collectors gathered, in the labels (DisplayName
+// qualifiers) and in every string value and array element, with the link
+// tricks that a browser decodes: the whole report shows it as text, and no
+// tag of any page carries it.
+TEST_F(ReportCommand, CollectedMarkupNeverBecomesLive) {
+    const std::vector<std::string> payloads = {
+        "<a href=\"java&#115;cript&#58;alert(61)\">a</a>",
+        "<a href=\"java&amp;#115;cript&amp;#58;alert(62)\">b</a>",
+        "<a href=\"&#106;avascript&colon;alert(63)\">c</a>",
+        "<a href=\"jav&#x09;ascript:alert(64)\">d</a>",
+        "<a href=\"javascript:alert(65)\">e</a>",
+        "<script>alert(66)</script>",
+        "<img src=x onerror=alert(67)>",
+        "<br><font face=\"Courier\"><a href=\"x.html\" onclick=\"alert(68)\">f</a>",
+    };
+    auto xmlText = [](const std::string& text) {
+        std::string out;
+        for (char c : text) out += c == '<' ? "&lt;" : c == '>' ? "&gt;" : c == '&' ? "&amp;" : std::string(1, c);
+        return out;
+    };
+    size_t next = 0;
+    auto payload = [&] { return xmlText(payloads[next++ % payloads.size()]); };
+    std::vector<std::string> files;
+    const std::regex label(R"((<QUALIFIER NAME="DisplayName"[^>]*>\s*<VALUE>)([^<]*)(</VALUE>))");
+    const std::regex value(R"((<PROPERTY NAME="[^"]*" TYPE="string"[^>]*>\s*<VALUE>)([^<]*)(</VALUE>))");
+    const std::regex array(R"(<PROPERTY.ARRAY NAME="[^"]*" TYPE="string"[^>]*>\s*<VALUE.ARRAY>[\s\S]*?</VALUE.ARRAY>)");
+    const std::regex element(R"((<VALUE>)([^<]*)(</VALUE>))");
+    // Each match of `re` in `text` through `change`.
+    auto replace = [](const std::string& text, const std::regex& re, const std::function<std::string(const std::smatch&)>& change) {
+        std::string out;
+        auto last = text.cbegin();
+        for (std::sregex_iterator it(text.begin(), text.end(), re), end; it != end; ++it) {
+            out.append(last, (*it)[0].first);
+            out += change(*it);
+            last = (*it)[0].second;
+        }
+        out.append(last, text.cend());
+        return out;
+    };
+    auto plant = [&](const std::smatch& m) { return m[1].str() + m[2].str() + payload() + m[3].str(); };
+    for (const std::string& sample : SampleFiles()) {
+        std::string text = replace(replace(Slurp(sample), label, plant), value, plant);
+        text = replace(text, array, [&](const std::smatch& m) { return replace(m[0].str(), element, plant); });
+        files.push_back(Write(fs::path(sample).filename().string(), text));
+    }
+    TCommandResult r = RunBraigrion(Args({"report", "-o", Path("report")}, files));
+    ASSERT_EQ(0, r.fStatus) << r.fErr;
+
+    size_t shown = 0;
+    for (const auto& entry : fs::recursive_directory_iterator(Path("report"))) {
+        if (entry.path().extension() != ".html") continue;
+        const std::string page = Slurp(entry.path().string());
+        for (size_t open = page.find('<'); open != std::string::npos; open = page.find('<', open + 1)) {
+            const size_t close = page.find('>', open);
+            ASSERT_NE(std::string::npos, close) << entry.path();
+            std::string tag = page.substr(open, close + 1 - open);
+            for (auto& c : tag) c = static_cast<char>(std::tolower(static_cast<unsigned char>(c)));
+            // A tooltip is text (escaped, no quote can end it early); the rest of the tag is mark-up.
+            for (size_t title = tag.find(" title=\""); title != std::string::npos; title = tag.find(" title=\"")) {
+                const size_t end = tag.find('"', title + 8);
+                ASSERT_NE(std::string::npos, end) << tag;
+                tag.erase(title, end + 1 - title);
+            }
+            EXPECT_EQ(std::string::npos, tag.find("alert(")) << entry.path() << ": " << tag;
+            EXPECT_EQ(std::string::npos, tag.find("javascript")) << entry.path() << ": " << tag;
+            const size_t href = tag.find("href=\"");
+            if (href != std::string::npos) {
+                const std::string target = tag.substr(href + 6, tag.find('"', href + 6) - href - 6);
+                const bool web = target.compare(0, 7, "http://") == 0 || target.compare(0, 8, "https://") == 0;
+                EXPECT_EQ(std::string::npos, target.find('&')) << entry.path() << ": " << tag;
+                EXPECT_TRUE(web || target.find(':') == std::string::npos) << entry.path() << ": " << tag;
+            }
+        }
+        for (size_t at = page.find("alert(6"); at != std::string::npos; at = page.find("alert(6", at + 1)) ++shown;
+    }
+    EXPECT_GT(next, 100u) << "payloads were planted";
+    EXPECT_GT(shown, next / 2) << "and reached the pages as text";
+}
+
+// --force on the directory that holds the collection, or on one that only
+// looks like a report: the report never deletes nor overwrites a file it did
+// not write.
+TEST_F(ReportCommand, ForceNeverTouchesFilesTheReportDidNotWrite) {
+    fs::create_directories(Path("data"));
+    std::vector<std::string> inputs;
+    for (const std::string& file : SampleFiles()) {
+        const std::string copy = Path("data/" + fs::path(file).filename().string());
+        fs::copy_file(file, copy);
+        inputs.push_back(copy);
+    }
+    std::vector<std::string> before;
+    for (const std::string& input : inputs) before.push_back(Slurp(input));
+    for (int run = 0; run < 2; ++run) {
+        TCommandResult r = RunBraigrion(Args({"report", "--force", "-o", Path("data")}, inputs));
+        ASSERT_EQ(0, r.fStatus) << r.fErr;
+        for (size_t i = 0; i < inputs.size(); ++i) EXPECT_EQ(before[i], Slurp(inputs[i])) << inputs[i];
+        EXPECT_TRUE(fs::exists(Path("data/index.html")));
+    }
+
+    // A marker that is only an empty file makes no report of a directory.
+    fs::create_directories(Path("fake"));
+    Write("fake/.braigrion-report", "");
+    Write("fake/keep.txt", "keep");
+    EXPECT_EQ(2, RunBraigrion(Args({"report", "-o", Path("fake")}, SampleFiles())).fStatus);
+    ASSERT_EQ(0, RunBraigrion(Args({"report", "--force", "-o", Path("fake")}, SampleFiles())).fStatus);
+    EXPECT_EQ("keep", Slurp(Path("fake/keep.txt")));
+
+    // A file of someone else's where the report puts one of its own: nothing
+    // is replaced, and the line says which file.
+    fs::create_directories(Path("taken"));
+    Write("taken/index.html", "someone's page");
+    TCommandResult taken = RunBraigrion(Args({"report", "--force", "-o", Path("taken")}, SampleFiles()));
+    EXPECT_EQ(1, taken.fStatus);
+    EXPECT_NE(std::string::npos, taken.fErr.find("holds index.html, which the report did not write")) << taken.fErr;
+    EXPECT_EQ(1, Lines(taken.fErr)) << taken.fErr;
+    EXPECT_EQ("someone's page", Slurp(Path("taken/index.html")));
+    EXPECT_EQ((std::vector<std::string>{"index.html"}), [&] {
+        std::vector<std::string> names;
+        for (const auto& entry : fs::directory_iterator(Path("taken"))) names.push_back(entry.path().filename().string());
+        return names;
+    }()) << "nothing added either";
+    EXPECT_EQ((std::vector<std::string>{"data", "fake", "taken"}), Entries()) << "no work directory left";
 }
 
 TEST_F(ReportCommand, RefusesWithOneLineAndTheRightStatus) {
@@ -137,6 +268,10 @@ TEST_F(ReportCommand, RefusesWithOneLineAndTheRightStatus) {
                                   "<DECLARATION><DECLGROUP>\n  <VALUE.OBJECT><INSTANCE CLASSNAME=\"X\">\n"
                                   "  </DECLGROUP>\n</CIM>\n");
     Write("a-file", "a file where a directory should be");
+    // A name that would break the line, and a file that exists but cannot be read.
+    std::string newline = Write("broken\nname.xml", Slurp(malformed));
+    fs::create_symlink(Path("loop-b"), Path("loop-a"));
+    fs::create_symlink(Path("loop-a"), Path("loop-b"));
     struct Case {
         std::vector<std::string> args;
         int status;
@@ -154,6 +289,9 @@ TEST_F(ReportCommand, RefusesWithOneLineAndTheRightStatus) {
         {Args({"report", "-o", Path("earlier")}, {malformed}), 2, "broken\\.xml:[0-9]+:[0-9]+: "},
         {Args({"report", "-o", Path("new")}, {malformed}), 2, "broken\\.xml:[0-9]+:[0-9]+: "},
         {Args({"report", "-o", Path("new")}, {Path("missing.xml")}), 2, "missing\\.xml: no such file"},
+        {{"info", newline}, 2, "\"[^\"]*broken\\\\nname\\.xml\":[0-9]+:[0-9]+: "},
+        {{"info", Path("missing\n.xml")}, 2, "missing\\\\n\\.xml\": no such file"},
+        {{"info", Path("loop-a")}, 2, "loop-a: Too many levels of symbolic links\n"},
         {Args({"report", "-o", Path("a-file")}, SampleFiles()), 2, "a-file: exists and is not a directory"},
         {Args({"report", "-o", Path("a-file/report")}, SampleFiles()), 1, "a-file/report: "},
         {Args({"report", "-o", "/proc/braigrion-report"}, SampleFiles()), 1, "cannot create the report"},
@@ -173,7 +311,8 @@ TEST_F(ReportCommand, RefusesWithOneLineAndTheRightStatus) {
         EXPECT_EQ("", r.fOut);
     }
     // Nothing was created, and the earlier report stands as it was.
-    EXPECT_EQ((std::vector<std::string>{"a-file", "broken.xml", "earlier"}), Entries());
+    EXPECT_EQ((std::vector<std::string>{"a-file", "broken\nname.xml", "broken.xml", "earlier", "loop-a", "loop-b"}),
+              Entries());
     EXPECT_EQ(earlierIndex, Slurp(Path("earlier/index.html")));
 }
 

@@ -49,6 +49,7 @@ TEST(RootObject, DefaultLoggerFiltersByLevelIntoAFile) {
     logger.SetLevel(1);
     logger.Log(0, "an error");
     logger.Log(1, "a warning");
+    logger.Log(0, "a value\nthat breaks\x1b the line");
     logger.Log(3, "a trace line");
     logger.SetLogToStderr();
     std::ifstream in(path);
@@ -57,6 +58,7 @@ TEST(RootObject, DefaultLoggerFiltersByLevelIntoAFile) {
     EXPECT_NE(std::string::npos, text.str().find("an error"));
     EXPECT_NE(std::string::npos, text.str().find("a warning"));
     EXPECT_EQ(std::string::npos, text.str().find("a trace line"));
+    EXPECT_NE(std::string::npos, text.str().find("[0] a value\\nthat breaks\\x1b the line\n")) << "one line a message";
     EXPECT_FALSE(logger.SetLogFile("/nonexistent-dir/x/log.txt"));
 }
 

@@ -140,3 +140,68 @@ TEST(ObjectPaths, KeysStatedOnlyByTheSourcePathStillName) {
     EXPECT_THROW(disk->GetProperty("SystemName", TCIMContext()), NORVTKR20::TTKRException)
         << "a key known only from the path is not a property";
 }
+
+// A path resolves on all its key bindings together, whatever key sorts first
+// and however many instances share it; a value matches the ways
+// KeyValuesEqual says it does.
+TEST(ObjectPaths, ResolveOnAllKeysTogetherAndMatchValuesByMeaning) {
+    auto ns = TMemoryNamespace::Create();
+    ns->DeclareClass(C("X_Device", "", {P("CreationClassName", T::eString, {Q("Key", TCIMValue::Boolean(true))}),
+                                        P("DeviceID", T::eString, {Q("Key", TCIMValue::Boolean(true))}),
+                                        P("Slot", T::eUint16, {Q("Key", TCIMValue::Boolean(true))})}));
+    ns->DeclareClass(C("X_Disk", "X_Device", {}));
+    std::vector<boost::shared_ptr<TMemoryInstance>> devices;
+    for (unsigned i = 0; i < 2000; ++i) {
+        devices.push_back(ns->AddInstance(i % 2 ? "X_Disk" : "X_Device",
+                                          {V("CreationClassName", TCIMValue("X_Device")),
+                                           V("DeviceID", TCIMValue("dev" + std::to_string(i / 2))),
+                                           V("Slot", TCIMValue(static_cast<unsigned short>(i % 2)))}));
+    }
+    ns->Link();
+    TCIMContext none;
+    for (unsigned i : {0u, 1u, 777u, 1998u, 1999u}) {
+        TCIMReference path = devices[i]->GetPath(none);
+        path.SetClassName("X_Device");  // a subclass instance through its superclass
+        EXPECT_EQ(devices[i].get(), ns->GetInstance(path, none).get()) << path.GetPath();
+    }
+
+    struct {
+        const char* path;
+        int expected;  // index into devices, or -1 for no instance
+    } cases[] = {
+        {"X_Device.CreationClassName=\"X_Device\",DeviceID=\"dev5\",Slot=1", 11},
+        {"x_device.creationclassname=\"X_Device\",DEVICEID=\"dev5\",slot=1", 11},  // names ignore case
+        {"X_Device.CreationClassName=\"X_Device\",DeviceID=\"dev5\",Slot=\"1\"", 11},  // a number in text
+        {"X_Device.CreationClassName=\"X_Device\",DeviceID=\"dev5\",Slot=\"0x1\"", 11},
+        {"X_Device.CreationClassName=\"X_Device\",DeviceID=\"dev5\",Slot=1.0", 11},
+        {"X_Device.CreationClassName=\"X_Device\",DeviceID=\"dev5\",Slot=TRUE", 11},  // a boolean is 1
+        {"X_Device.CreationClassName=\"X_Device\",DeviceID=\"DEV5\",Slot=1", -1},  // text keeps its case
+        {"X_Device.CreationClassName=\"X_Device\",DeviceID=\"dev5\",Slot=2", -1},
+        {"X_Device.CreationClassName=\"X_Device\",DeviceID=\"dev5\"", 10},  // fewer keys: the first that fits
+        {"X_Disk.CreationClassName=\"X_Device\",DeviceID=\"dev5\"", 11},
+        {"X_Disk.CreationClassName=\"X_Device\",DeviceID=\"dev5\",Slot=0", -1},  // not of that class
+        {"X_Device.DeviceID=\"dev5\",Unknown=\"x\"", -1},
+        {"X_Disk", 1},  // no keys: the first of the class
+    };
+    for (const auto& c : cases) {
+        TCIMReference path(ns, c.path, none);
+        ASSERT_EQ(std::string(c.path).find('.') == std::string::npos, path.GetKeyBindings().empty()) << c.path;
+        auto element = path.GetCIMElement(false);
+        TMemoryInstance* found = element ? dynamic_cast<TMemoryInstance*>(element.get()) : nullptr;
+        EXPECT_EQ(c.expected < 0 ? nullptr : devices[static_cast<size_t>(c.expected)].get(), found) << c.path;
+    }
+
+    // References as keys: class and key names ignore case, values by meaning.
+    ns->DeclareClass(C("X_Link", "", {Ref("Antecedent", "X_Device"), Ref("Dependent", "X_Device")}));
+    auto link = ns->AddInstance("X_Link", {V("Antecedent", RefTo(ns, "X_Device.CreationClassName=\"X_Device\",DeviceID=\"dev1\",Slot=0")),
+                                           V("Dependent", RefTo(ns, "X_Disk.CreationClassName=\"X_Device\",DeviceID=\"dev1\",Slot=1"))});
+    TCIMReference byReferences(ns, "X_Link", none);
+    byReferences.AddKeyValue("antecedent", RefTo(ns, "x_device.deviceid=\"dev1\",slot=\"0\",creationclassname=\"X_Device\""));
+    byReferences.AddKeyValue("Dependent", RefTo(ns, "X_Disk.CreationClassName=\"X_Device\",DeviceID=\"dev1\",Slot=1"));
+    EXPECT_EQ(link.get(), ns->GetInstance(byReferences, none).get());
+    std::vector<boost::shared_ptr<ICIMInstance>> associated;
+    devices[2]->EnumerateAssociatedInstances(NORVTKR20::TAddToVectorCallback<ICIMInstance>(associated), "", "", "", "",
+                                             none);
+    ASSERT_EQ(1u, associated.size());
+    EXPECT_EQ(devices[3].get(), associated[0].get());
+}

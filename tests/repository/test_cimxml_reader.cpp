@@ -303,6 +303,24 @@ const struct {
      "KEYVALUE \"seven\" of key K is not a number"},
     {R"(<VALUE.OBJECT><INSTANCE CLASSNAME="A"></@VALUE.OBJECT></INSTANCE>)",
      "closing tag does not match the open element INSTANCE"},
+    // Values that do not fit, on classes as on instances.
+    {R"(<VALUE.OBJECT><INSTANCE CLASSNAME="A"><PROPERTY NAME="C" TYPE="char16">@<VALUE>ab</VALUE></PROPERTY></INSTANCE></VALUE.OBJECT>)",
+     "VALUE \"ab\" does not fit TYPE char16 of property C"},
+    {R"(<VALUE.OBJECT><CLASS NAME="A"><PROPERTY NAME="C" TYPE="char16">@<VALUE>&#xE9;&#xE9;</VALUE></PROPERTY></CLASS></VALUE.OBJECT>)",
+     "VALUE \"\xC3\xA9\xC3\xA9\" does not fit TYPE char16 of property C"},
+    {R"(<VALUE.OBJECT><CLASS NAME="A">@<PROPERTY.ARRAY NAME="L" TYPE="uint8" ARRAYSIZE="-1"/></CLASS></VALUE.OBJECT>)",
+     "ARRAYSIZE \"-1\" is not a count"},
+    {R"(<VALUE.OBJECT><INSTANCE CLASSNAME="A">@<PROPERTY.ARRAY NAME="L" TYPE="uint8" ARRAYSIZE="-1"/></INSTANCE></VALUE.OBJECT>)",
+     "ARRAYSIZE \"-1\" is not a count"},
+    {R"(<VALUE.OBJECT><INSTANCE CLASSNAME="A">@<PROPERTY.ARRAY NAME="L" TYPE="uint8" ARRAYSIZE="18446744073709551617"/></INSTANCE></VALUE.OBJECT>)",
+     "ARRAYSIZE \"18446744073709551617\" is not a count"},
+    {R"(<VALUE.OBJECT><CLASS NAME="A">@<PROPERTY.ARRAY NAME="L" TYPE="uint8" ARRAYSIZE="4294967296"/></CLASS></VALUE.OBJECT>)",
+     "ARRAYSIZE \"4294967296\" is not a count"},
+    // Names and values that would break the line are shown escaped.
+    {R"(<VALUE.OBJECT><INSTANCE CLASSNAME="A">@<PROPERTY NAME="two&#10;lines" TYPE="int32"/></INSTANCE></VALUE.OBJECT>)",
+     "unknown TYPE \"int32\" of PROPERTY two\\nlines"},
+    {R"(<VALUE.OBJECT><INSTANCE CLASSNAME="A"><PROPERTY NAME="N" TYPE="uint8">@<VALUE>1&#13;&#10;2&#9;</VALUE></PROPERTY></INSTANCE></VALUE.OBJECT>)",
+     "VALUE \"1\\r\\n2\\t\" does not fit TYPE uint8 of property N"},
 };
 
 TEST(CIMXMLReader, BadInputFailsWithFileLineColumnAndReason) {
@@ -313,6 +331,12 @@ TEST(CIMXMLReader, BadInputFailsWithFileLineColumnAndReason) {
         EXPECT_STREQ(FailureOf(Declaration(body)).what(),
                      ("bad.xml:3:" + std::to_string(mark + 1) + ": " + bad.fMessage).c_str());
     }
+}
+
+TEST(CIMXMLReader, FileNamesThatWouldBreakTheLineAreQuoted) {
+    const std::string xml = Declaration(R"(<VALUE.OBJECT><WIDGET/></VALUE.OBJECT>)");
+    EXPECT_STREQ("\"two\\nlines.xml\":3:15: unknown element WIDGET", FailureOf(xml, "two\nlines.xml").what());
+    EXPECT_EQ("two\nlines.xml", FailureOf("<CIM>", "two\nlines.xml").File()) << "the name itself is kept";
 }
 
 TEST(CIMXMLReader, TruncatedDocumentNamesTheUnclosedElement) {
@@ -362,7 +386,9 @@ TEST(CIMXMLFiles, SeveralFilesMakeOneCollectionAndAFailingFileAddsNothing) {
         LoadCollection({schema, TempPath("absent.xml")});
         ADD_FAILURE() << "loaded";
     } catch (const TLoadError& error) {
-        EXPECT_NE(error.Message().find("cannot open file"), std::string::npos) << error.what();
+        EXPECT_NE(error.Message().find("cannot open file: No such file or directory"), std::string::npos) << error.what();
+        EXPECT_EQ(TempPath("absent.xml") + ": cannot open file: No such file or directory", error.what())
+            << "no line or column where there is none";
     }
 
     boost::shared_ptr<TMemoryNamespace> ns = LoadCollection({TempPath("data.xml")}).fNamespace;
