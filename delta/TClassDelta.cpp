@@ -3,6 +3,7 @@
 // collections by their key properties, and linking parents and dependents.
 #include "delta/TClassDelta.h"
 
+#include <algorithm>
 #include <iomanip>
 #include <iostream>
 
@@ -121,9 +122,18 @@ void TClassDelta::Init(TNamespacePtr ns, TContext context) {
         fDeltaContainerNames.push_back(NORVTKR20::TCIMSchemaHelper::GetRawSerialNumberString(ns, context));
         sameMachine = sameMachine && fDeltaContainerNames.back() == fDeltaContainerNames.front();
     }
+    std::vector<std::string> times(count);
     for (unsigned short index = 0; index < count; ++index) {
         context["nsIndex"] = TCIMValue(index);
         TContext at = context;
+        TInstancePtr zone = FirstInstance(ns, "ORVSG_TimeZone", at);
+        if (zone) {
+            try {
+                times[index] = TWriterUtil::GetDateTime(zone->GetProperty("LocalDateTime", at)->GetValue(at), false);
+            } catch (const TTKRException& ex) {
+                if (!IsNotFound(ex)) throw;
+            }
+        }
         if (!sameMachine) {
             TInstancePtr service = FirstInstance(ns, "ORVSG_IPService", at);
             if (!service) continue;
@@ -132,14 +142,20 @@ void TClassDelta::Init(TNamespacePtr ns, TContext context) {
             } catch (const TTKRException& ex) {
                 if (!IsNotFound(ex)) throw;
             }
-        } else {
-            TInstancePtr zone = FirstInstance(ns, "ORVSG_TimeZone", at);
-            if (!zone) continue;
-            try {
-                fDeltaContainerNames[index] =
-                    TWriterUtil::GetDateTime(zone->GetProperty("LocalDateTime", at)->GetValue(at), false);
-            } catch (const TTKRException& ex) {
-                if (!IsNotFound(ex)) throw;
+        } else if (zone) {
+            fDeltaContainerNames[index] = times[index];
+        }
+    }
+    // Two collections of one machine among several machines share a host
+    // name; their collection times tell them apart.
+    for (unsigned short index = 0; index < count; ++index) {
+        const std::string label = fDeltaContainerNames[index];
+        if (times[index].empty() || label == times[index]) continue;
+        if (std::count(fDeltaContainerNames.begin(), fDeltaContainerNames.end(), label) > 1) {
+            for (unsigned short other = index; other < count; ++other) {
+                if (fDeltaContainerNames[other] == label && !times[other].empty()) {
+                    fDeltaContainerNames[other] = label + " (" + times[other] + ")";
+                }
             }
         }
     }

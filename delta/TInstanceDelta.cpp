@@ -25,6 +25,13 @@ TClassDelta::TContext AtIndex(const TClassDelta& owner, size_t index) {
     return context;
 }
 
+// A cell of a source that agrees with the baseline: the literal text and
+// all three display flags, which the back-ends show as agreement.
+void MarkSame(TTable::TCell& cell) {
+    cell.text = kSame;
+    cell.flags[0] = cell.flags[1] = cell.flags[2] = true;
+}
+
 // One column of the differences: fed by a record or by a compared
 // association column.
 struct TDeltaColumn {
@@ -205,8 +212,12 @@ void TInstanceDelta::WritePropertyDeltaTable(TWriter* writer, TWritten& written)
                     for (size_t index = 0; index < texts.size() && index < count; ++index) {
                         if (index > 0 && texts[index].empty()) continue;
                         TTable::TCell& cell = table.Cell(rowOf[index], col);
-                        cell.text = texts[index];
                         cell.monospaced = mono;
+                        if (index > 0 && texts[index] == texts[0]) {
+                            MarkSame(cell);
+                        } else {
+                            cell.text = texts[index];
+                        }
                     }
                     continue;
                 }
@@ -232,9 +243,8 @@ void TInstanceDelta::WritePropertyDeltaTable(TWriter* writer, TWritten& written)
                 for (size_t index = 1; index < count; ++index) {
                     if (!marked[index] || std::find(listed.begin(), listed.end(), index) != listed.end()) continue;
                     TTable::TCell& cell = table.Cell(rowOf[index], col);
-                    cell.text = kSame;
                     cell.monospaced = mono;
-                    cell.flags[0] = cell.flags[1] = cell.flags[2] = true;
+                    MarkSame(cell);
                 }
             }
             writer->WriteTableGrid(table);

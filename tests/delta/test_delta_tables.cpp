@@ -61,6 +61,13 @@ TEST(DeltaLabels, SameSerialIsLabelledByTimeDifferentByHost) {
     EXPECT_NE(std::string::npos, byTime[0].find("2024")) << byTime[0];
     EXPECT_NE(byTime[0], byTime[1]);
     EXPECT_EQ((std::vector<std::string>{"alpha", "beta"}), labels("SN2"));
+
+    // One machine twice beside another: the host name is shared, the time tells.
+    TDeltaRun three({Disks("SN1", "alpha", kMarch, {}).Namespace(), Disks("SN1", "alpha", kApril, {}).Namespace(),
+                     Disks("SN2", "beta", kApril, {}).Namespace()},
+                    testing::EmptyRecords());
+    EXPECT_EQ((std::vector<std::string>{"alpha (" + byTime[0] + ")", "alpha (" + byTime[1] + ")", "beta"}),
+              TClassDelta::GetDeltaContainerNames());
 }
 
 TEST(DeltaPage, RecordsForColumnsThePageDoesNotShowCountForNothing) {
