@@ -190,6 +190,7 @@ void TInstanceDelta::WritePropertyDeltaTable(TWriter* writer, TWritten& written)
         for (const std::vector<TDeltaColumn>& part : SplitByWidth(columns)) {
             TTable table(rows, static_cast<int>(part.size()) + 1, true);
             table.fColumnHeaders = true;
+            table.fFlagB = true;  // a grid of differences: row 1 is the baseline
             table.fTableWidth = TReportParameters::ConvertPercent(reportClass.GetTableWidth());
             int sum = kDataSourceWidth;
             for (const TDeltaColumn& column : part) sum += column.width;
@@ -198,7 +199,7 @@ void TInstanceDelta::WritePropertyDeltaTable(TWriter* writer, TWritten& written)
             table.Cell(0, 0).text = "Data Source";
             for (size_t index = 0; index < count; ++index) {
                 if (index == 0 || marked[index]) {
-                    table.Cell(rowOf[index], 0).text = index < labels.size() ? labels[index] : "";
+                    table.Cell(rowOf[index], 0).text = writer->EscapeText(index < labels.size() ? labels[index] : "");
                 }
             }
             for (size_t c = 0; c < part.size(); ++c) {

@@ -167,5 +167,27 @@ TEST(CompareCommand, SavedRecordsGiveTheSameReport) {
     fs::remove_all(work);
 }
 
+TEST(CompareCommand, TheHtmlReportMarksDifferencesAndAgreement) {
+    const fs::path work = fs::temp_directory_path() / ("braigrion-compare-html-" + std::to_string(::getpid()));
+    fs::remove_all(work);
+    fs::create_directories(work);
+    cli::TCompareOptions options;
+    options.fCollections = {kSamples + "linux-server", kSamples + "linux-server-later", kSamples + "linux-server-peer"};
+    options.fQuiet = true;
+    options.fOutput = (work / "report").string();
+    std::ostringstream out, err;
+    ASSERT_EQ(0, cli::RunCompare(options, out, err, false)) << err.str();
+    std::ifstream in(work / "report" / "net.html");
+    std::ostringstream html;
+    html << in.rdbuf();
+    const std::string page = html.str();
+    // The MTU of the later collection differs; the peer agrees with the baseline.
+    EXPECT_NE(std::string::npos, page.find("<td class=\"differs\">1500</td>")) << page;
+    EXPECT_NE(std::string::npos, page.find("<td class=\"same\">--- SAME ---</td>")) << page;
+    EXPECT_EQ(std::string::npos, page.find("<td class=\"differs\">9000</td>")) << "the baseline row is plain";
+    EXPECT_EQ(std::string::npos, page.find(">--- SAME ---</th>")) << "an agreeing cell is no label";
+    fs::remove_all(work);
+}
+
 }  // namespace
 }  // namespace braigrion
