@@ -284,10 +284,12 @@ TCIMReference TClassDelta::ConvertReference(const TCIMReference& reference, cons
                 fKeyNames.push_back(binding.first);
                 return true;
             });
-            fKeyNamesKnown = true;
             break;
         }
-        if (!fKeyNamesKnown || fKeyNames.empty()) return reference;
+        // The records are all placed before the first path is converted:
+        // a class without any keeps the paths as they come, and need not
+        // look again.
+        fKeyNamesKnown = true;
     }
     if (fKeyNames.empty()) return reference;
     std::map<std::string, TCIMValue> keys;
