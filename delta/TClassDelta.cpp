@@ -169,12 +169,17 @@ void TClassDelta::Uninit() {
 void TClassDelta::FindDeltas(TNamespacePtr ns, const std::string& className, TInstances& result) {
     Trace("Entering TClassDelta::FindDeltas");
     TContext context;
-    context["nsIndex"] = TCIMValue(static_cast<unsigned short>(0));
     boost::shared_ptr<ICIMClass> cls;
-    try {
-        cls = ns->GetClass(className, context);
-    } catch (const TTKRException& ex) {
-        throw TTKRException(ex.fStatusCode);
+    // The class as the baseline has it; a class that only later collections
+    // hold is looked up there, so that its instances unique to them show.
+    const size_t count = std::max<size_t>(1, fDeltaContainerNames.size());
+    for (size_t index = 0; !cls; ++index) {
+        context["nsIndex"] = TCIMValue(static_cast<unsigned short>(index));
+        try {
+            cls = ns->GetClass(className, context);
+        } catch (const TTKRException& ex) {
+            if (!IsNotFound(ex) || index + 1 >= count) throw TTKRException(ex.fStatusCode);
+        }
     }
     std::vector<boost::shared_ptr<ICIMClass>> family{cls};
     cls->EnumerateSubClasses(TAddToVectorCallback<ICIMClass>(family), true, context);

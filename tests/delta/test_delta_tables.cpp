@@ -340,5 +340,16 @@ TEST(DeltaPage, MissingAndPropertyRecordsPutAnInstanceInBothTables) {
     EXPECT_LT(page.find("\"Missing from gamma\""), page.find("\"Unique to beta, gamma\""));
 }
 
+TEST(DeltaPage, AClassOnlyALaterSourceHoldsShowsAsUnique) {
+    TNs records = testing::EmptyRecords();
+    TDeltaRecordWriter(records).Add("ORVSG_Agent", 2, "", "ORVSG_Agent.Name=\"updater\"", {1});
+    TCollection later("SN1", "alpha", kApril);
+    later.Add("ORVSG_Agent.Name=\"updater\"", {Val("Version", TCIMValue("3.2"))});
+    TDeltaRun run({Disks("SN1", "alpha", kMarch, {}).Namespace(), later.Namespace()}, records);
+    const std::string page = Digest(run.Page(Page({Table("ORVSG_Agent", "", {Col("Name", "50%"), Col("Version", "50%")})})));
+    EXPECT_NE(std::string::npos, page.find("  | \"updater\" \"3.2\"\n")) << page;
+    EXPECT_NE(std::string::npos, page.find("\"Unique to " + TClassDelta::GetDeltaContainerNames()[1] + "\"")) << page;
+}
+
 }  // namespace
 }  // namespace braigrion
