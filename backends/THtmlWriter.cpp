@@ -162,7 +162,13 @@ void THtmlWriter::WriteTableGrid(TTable& table) {
     out += kTableHeaderWidth + Percent(table.fTableWidth > 0 ? table.fTableWidth : 100) + kTableHeaderMid + "t" +
            std::to_string(fTableCounter) + kTableHeaderEnd;
 
-    auto cellText = [](const TTable::TCell& cell) {
+    // A cell with all three flags agrees with the baseline of a grid of
+    // differences: its text is plain, and it is shown subdued.
+    auto agrees = [](const TTable::TCell& cell) {
+        return cell.flags[kSpansRow] && cell.flags[kFinalText] && cell.flags[kHeaderCell];
+    };
+    auto cellText = [&agrees](const TTable::TCell& cell) {
+        if (agrees(cell)) return KeepTokensWhole(EscapeHtml(cell.text));
         return KeepTokensWhole(cell.flags[kFinalText] ? cell.text : SanitizeCellMarkup(cell.text));
     };
     // Column and row labels come from the collection's DisplayName
@@ -183,7 +189,7 @@ void THtmlWriter::WriteTableGrid(TTable& table) {
     out += "<tbody>\n";
     for (int r = firstBodyRow; r < table.fRows; ++r) {
         const TTable::TCell& first = table.Cell(r, 0);
-        if (first.flags[kSpansRow]) {
+        if (first.flags[kSpansRow] && !agrees(first)) {
             out += kTableRowBeg + " class=\"spanrow\"" + kTableRowMid + "<td colspan=\"" + std::to_string(table.fCols) +
                    "\">" + cellText(first) + "</td>" + kTableRowEnd + "\n";
             continue;
@@ -191,14 +197,22 @@ void THtmlWriter::WriteTableGrid(TTable& table) {
         out += kTableRowBeg + kTableRowMid;
         for (int c = 0; c < table.fCols; ++c) {
             const TTable::TCell& cell = table.Cell(r, c);
-            if ((c == 0 && table.fRowHeaders) || cell.flags[kHeaderCell]) {
+            if ((c == 0 && table.fRowHeaders) || (cell.flags[kHeaderCell] && !agrees(cell))) {
                 out += kTableHeaderElementBegin + Percent(table.fColumnWidths[static_cast<size_t>(c)]) +
                        kTableHeaderElementMid + (c == 0 && table.fRowHeaders ? labelText(cell) : cellText(cell)) +
                        kTableHeaderElementEnd;
                 continue;
             }
             out += "<td";
-            if (cell.monospaced) out += " class=\"mono\"";
+            std::string classes = cell.monospaced ? "mono" : "";
+            if (agrees(cell)) {
+                classes += classes.empty() ? "same" : " same";
+            } else if (table.fFlagB && r >= 2 && c >= 1 && !cell.text.empty()) {
+                // In a grid of differences, row 1 is the baseline; a value
+                // below it differs from the baseline's.
+                classes += classes.empty() ? "differs" : " differs";
+            }
+            if (!classes.empty()) out += " class=\"" + classes + "\"";
             if (!cell.rawText.empty()) out += " title=\"" + EscapeHtml(cell.rawText) + "\"";
             out += ">" + cellText(cell) + "</td>";
         }

@@ -48,9 +48,22 @@ struct TPageOptions {
     TRunOptions fRun;
 };
 
+// Two or more collections compared: the first is the baseline.
+struct TCompareOptions {
+    std::vector<std::string> fCollections;  // each a directory or FILE[:FILE...]
+    std::string fOutput;
+    std::string fFormat = "html";
+    std::string fRecords;      // read the delta records from this file
+    std::string fSaveRecords;  // save the computed records to this file
+    bool fForce = false;
+    bool fQuiet = false;
+    TRunOptions fRun;
+};
+
 CLI::App* AddInfoCommand(CLI::App& app, TInfoOptions& options);
 CLI::App* AddReportCommand(CLI::App& app, TReportOptions& options);
 CLI::App* AddPageCommand(CLI::App& app, TPageOptions& options);
+CLI::App* AddCompareCommand(CLI::App& app, TCompareOptions& options);
 
 // Prints what a collection holds: its data source facts, its operating
 // system and its classes with their instance counts.
@@ -60,6 +73,12 @@ int RunInfo(const TInfoOptions& options, std::ostream& out, std::ostream& err);
 // (pages written, pages without data, page ids not available in this
 // version) goes to `err` in any case.
 int RunReport(const TReportOptions& options, std::ostream& out, std::ostream& err, bool progressToErr);
+// Writes the delta report of several collections into a directory and
+// prints the path of its index.
+int RunCompare(const TCompareOptions& options, std::ostream& out, std::ostream& err, bool progressToErr);
+// The files of one collection argument of compare: a directory's .xml
+// files sorted by name, or the files of FILE[:FILE...].
+std::vector<std::string> CollectionFiles(const std::string& argument);
 // Prints one page through the inventory back-end.
 int RunPage(const TPageOptions& options, std::ostream& out, std::ostream& err);
 

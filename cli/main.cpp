@@ -26,6 +26,8 @@ int main(int argc, char** argv) {
     CLI::App* infoCmd = braigrion::cli::AddInfoCommand(app, info);
     CLI::App* reportCmd = braigrion::cli::AddReportCommand(app, report);
     CLI::App* pageCmd = braigrion::cli::AddPageCommand(app, page);
+    braigrion::cli::TCompareOptions compare;
+    CLI::App* compareCmd = braigrion::cli::AddCompareCommand(app, compare);
 
     // CLI11 would call an unknown word a missing subcommand; name it instead.
     if (argc > 1 && argv[1][0] != '-' && app.get_subcommands([&](CLI::App* sub) { return sub->get_name() == argv[1]; }).empty()) {
@@ -50,6 +52,9 @@ int main(int argc, char** argv) {
         if (*infoCmd) return braigrion::cli::RunInfo(info, std::cout, std::cerr);
         if (*reportCmd) return braigrion::cli::RunReport(report, std::cout, std::cerr, isatty(STDERR_FILENO) != 0);
         if (*pageCmd) return braigrion::cli::RunPage(page, std::cout, std::cerr);
+        if (*compareCmd) {
+            return braigrion::cli::RunCompare(compare, std::cout, std::cerr, isatty(STDERR_FILENO) != 0);
+        }
     } catch (const braigrion::cli::TInputError& e) {
         // One line, whatever names and values the message carries.
         std::cerr << "braigrion: " << braigrion::repository::PrintableText(e.what()) << '\n';

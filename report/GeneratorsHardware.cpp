@@ -15,16 +15,16 @@ namespace braigrion {
 
 using namespace generators;
 
-void TWriter::Generator_HardwareInventory(TBuilderPtr builder, std::string pageID) {
+void TWriter::Generator_HardwareInventory(TBuilderPtr builder, std::string /*pageID*/) {
     WriteOrCompare(
         "TWriter::Generator_HardwareInventory", fProviderType == kDeltaProviderType,
         [&] { WriteGenericReport(builder->BuildHardwareInfoParams()); },
-        [&] { NotYetGenerated(pageID); });  // WriteGenericDeltaReport(builder->BuildHardwareInfoParams())
+        [&] { WriteGenericDeltaReport(builder->BuildHardwareInfoParams()); });
 }
 
 // In LUZ mode an HTML report has a raw-data page beside the PCI page, and
 // the PCI page links to it.
-void TWriter::Generator_PCIInformation(TBuilderPtr builder, std::string pageID) {
+void TWriter::Generator_PCIInformation(TBuilderPtr builder, std::string /*pageID*/) {
     const bool withRawData = fMode == "luz" && fWriterType == TKR_REPORT_DEFINITION::TKR_WRITER_TYPE_HTML;
     WriteOrCompare(
         "TWriter::Generator_PCIInformation", fProviderType == kDeltaProviderType,
@@ -41,14 +41,14 @@ void TWriter::Generator_PCIInformation(TBuilderPtr builder, std::string pageID) 
                 WriteGenericReport(params);
             }
         },
-        [&] { NotYetGenerated(pageID); });  // WriteGenericDeltaReport(builder->BuildPCIInfoParams())
+        [&] { WriteGenericDeltaReport(builder->BuildPCIInfoParams()); });
 }
 
 void TWriter::Generator_FirmwareVPD(TBuilderPtr builder, std::string pageID) {
     WriteOrCompare(
         "TWriter::Generator_FirmwareVPD", fProviderType == kDeltaProviderType,
         [&] { WriteCustomFirmwareReport(builder, pageID); },
-        [&] { NotYetGenerated(pageID); });  // WriteGenericDeltaReport(builder->BuildFirmwareParams())
+        [&] { WriteGenericDeltaReport(builder->BuildFirmwareParams()); });
 }
 
 void TWriter::Generator_ServProcConfiguration(TBuilderPtr builder, std::string pageID) {

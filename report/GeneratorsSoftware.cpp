@@ -2,10 +2,8 @@
 // installation and configuration, network, resources and processes.
 //
 // Outside delta mode each page is declared by the builder and written by the
-// generic page writer. In delta mode a page is compared with its counterparts
-// instead; until the comparison is part of the library, a call of
-// NotYetGenerated stands for each compared page, and the comment beside it
-// names the call that replaces it.
+// generic page writer. In delta mode the same definition is compared across
+// the collections of the view instead (WriteGenericDeltaReport).
 #include "braigrion/ReportDefinition.h"
 #include "braigrion/TWriter.h"
 #include "GeneratorSupport.h"
@@ -26,11 +24,11 @@ bool IsLinux(int osType) {
 
 }  // namespace
 
-void TWriter::Generator_SystemOverview(TBuilderPtr builder, std::string pageID) {
+void TWriter::Generator_SystemOverview(TBuilderPtr builder, std::string /*pageID*/) {
     WriteOrCompare(
         "TWriter::Generator_SystemOverview", fProviderType == kDeltaProviderType,
         [&] { WriteGenericReport(builder->BuildSystemConfigParams()); },
-        [&] { NotYetGenerated(pageID); });  // WriteGenericDeltaReport(builder->BuildSystemConfigParams())
+        [&] { WriteGenericDeltaReport(builder->BuildSystemConfigParams()); });
 }
 
 // The critical details exist for the inventory back-end only.
@@ -50,15 +48,14 @@ void TWriter::Generator_CriticalDetails(TBuilderPtr builder, std::string /*pageI
 // Installed software, and by operating system its components and fixes,
 // drivers and services, or its packages and kernel modules. In delta mode
 // each page is compared instead of written.
-void TWriter::Generator_OSInstallation(TBuilderPtr builder, std::string pageID) {
+void TWriter::Generator_OSInstallation(TBuilderPtr builder, std::string /*pageID*/) {
     const std::string name = "TWriter::Generator_OSInstallation";
     const bool delta = fProviderType == kDeltaProviderType;
     typedef TReportParameters (TReportParametersBuilder::*TBuild)() const;
-    // One page of the installation: written, or in delta mode compared
-    // (WriteGenericDeltaReport of the same definition).
+    // One page of the installation: written, or in delta mode compared.
     auto page = [&](TBuild build) {
         if (delta) {
-            NotYetGenerated(pageID);
+            WriteGenericDeltaReport((builder.get()->*build)());
         } else {
             WriteGenericReport((builder.get()->*build)());
         }
@@ -84,17 +81,20 @@ void TWriter::Generator_OSInstallation(TBuilderPtr builder, std::string pageID) 
 
 // The network page has one link and two definitions: with the team tables
 // when some port belongs to a team, without them otherwise.
-void TWriter::Generator_NetworkSettings(TBuilderPtr builder, std::string pageID) {
+void TWriter::Generator_NetworkSettings(TBuilderPtr builder, std::string /*pageID*/) {
     WriteOrCompare(
         "TWriter::Generator_NetworkSettings", fProviderType == kDeltaProviderType,
         [&] {
             WriteGenericReport(builder->HasTeamInfo() ? builder->BuildNetworkWithTeamingParams()
                                                       : builder->BuildNetworkWithoutTeamingParams());
         },
-        [&] { NotYetGenerated(pageID); });  // WriteGenericDeltaReport(params), chosen alike
+        [&] {
+            WriteGenericDeltaReport(builder->HasTeamInfo() ? builder->BuildNetworkWithTeamingParams()
+                                                           : builder->BuildNetworkWithoutTeamingParams());
+        });
 }
 
-void TWriter::Generator_ResourceUtilization(TBuilderPtr builder, std::string pageID) {
+void TWriter::Generator_ResourceUtilization(TBuilderPtr builder, std::string /*pageID*/) {
     const std::string name = "TWriter::Generator_ResourceUtilization";
     if (fPreboot) {
         Trace(name + kEntering);
@@ -105,10 +105,10 @@ void TWriter::Generator_ResourceUtilization(TBuilderPtr builder, std::string pag
     WriteOrCompare(
         name, fProviderType == kDeltaProviderType,
         [&] { WriteGenericReport(builder->BuildResourceUtilizationParams()); },
-        [&] { NotYetGenerated(pageID); });  // WriteGenericDeltaReport(builder->BuildResourceUtilizationParams())
+        [&] { WriteGenericDeltaReport(builder->BuildResourceUtilizationParams()); });
 }
 
-void TWriter::Generator_Processes(TBuilderPtr builder, std::string pageID) {
+void TWriter::Generator_Processes(TBuilderPtr builder, std::string /*pageID*/) {
     const std::string name = "TWriter::Generator_Processes";
     if (fPreboot) {
         Trace(name + kEntering);
@@ -119,20 +119,20 @@ void TWriter::Generator_Processes(TBuilderPtr builder, std::string pageID) {
     WriteOrCompare(
         name, fProviderType == kDeltaProviderType,
         [&] { WriteGenericReport(builder->BuildProcessesParams()); },
-        [&] { NotYetGenerated(pageID); });  // WriteGenericDeltaReport(builder->BuildProcessesParams())
+        [&] { WriteGenericDeltaReport(builder->BuildProcessesParams()); });
 }
 
 // The configuration of the operating system (not for pre-boot data), and on
 // Linux, pre-boot data included, its configuration files. A VMware host has
 // no such files page. In delta mode both are compared.
-void TWriter::Generator_OSConfiguration(TBuilderPtr builder, std::string pageID) {
+void TWriter::Generator_OSConfiguration(TBuilderPtr builder, std::string /*pageID*/) {
     const std::string name = "TWriter::Generator_OSConfiguration";
     const bool delta = fProviderType == kDeltaProviderType;
     Trace(name + kEntering);
     if (!fPreboot) {
         if (delta) {
             Trace(name + kDeltaDoComparison);
-            NotYetGenerated(pageID);  // WriteGenericDeltaReport(builder->BuildOSConfigParams())
+            WriteGenericDeltaReport(builder->BuildOSConfigParams());
         } else {
             WriteGenericReport(builder->BuildOSConfigParams());
         }
@@ -143,7 +143,7 @@ void TWriter::Generator_OSConfiguration(TBuilderPtr builder, std::string pageID)
         Trace(name + " -- Under Linux, write Linux Config Files");
         if (delta) {
             Trace(name + kDeltaDoComparison);
-            NotYetGenerated(pageID);  // WriteGenericDeltaReport(builder->BuildSysConfigParams())
+            WriteGenericDeltaReport(builder->BuildSysConfigParams());
         } else {
             WriteGenericReport(builder->BuildSysConfigParams());
         }

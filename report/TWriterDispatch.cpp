@@ -6,6 +6,7 @@
 #include "braigrion/ReportDefinition.h"
 #include "braigrion/Trace.h"
 #include "braigrion/TWriter.h"
+#include "delta/TClassDelta.h"
 #include "tkrcore/TRootObject.h"
 
 namespace braigrion {
@@ -95,15 +96,13 @@ void TWriter::BaseInitialize(TNamespacePtr ns, TContext context, TBuilderPtr bui
     } catch (...) {
         Trace("TWriter::BaseInitialize -- Exception when initializing member variable");
     }
-    // A delta view sets up the state of the comparison here, from `context`,
-    // once the comparison is part of the library.
-    (void)context;
+    if (fProviderType == 1) TClassDelta::Init(ns, context);
     Trace("TWriter::BaseInitialize -- Exiting ");
 }
 
 void TWriter::BaseDispose() {
     Trace("TWriter::BaseDispose -- Entering ");
-    // A delta view releases the state of the comparison here.
+    TClassDelta::Uninit();
     Trace("TWriter::BaseDispose -- Exiting ");
 }
 

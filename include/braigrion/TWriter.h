@@ -304,6 +304,13 @@ public:
 
     // --- Delta comparison (delta/) ---
 
+    // A delta page from a definition: for each class, the instances that
+    // differ between the collections of the view (property differences,
+    // then those missing from some sources, then those unique to some),
+    // each under its parent on the page; index entry with whether any
+    // class had a difference.
+    void WriteGenericDeltaReport(TReportParameters params);
+
     // (end of block)
 
     // --- Back-end operations, in slot order ---

@@ -1,0 +1,110 @@
+// bench_compare: loads one CIM-XML file twice, as an earlier and a later
+// collection, changes the later one a little, and times the comparison that
+// makes the delta records against the time the two loads took.
+//
+//   bench_compare FILE.xml
+//
+// The later collection loses every 997th instance and has one property
+// changed on every 101st, so that the records of each kind are made. Figures
+// go to standard output one per line as "name: value".
+
+#include <sys/resource.h>
+
+#include <chrono>
+#include <cstdio>
+#include <string>
+#include <vector>
+
+#include "repository/CIMXMLReader.h"
+#include "repository/DeltaRecords.h"
+#include "repository/MemoryClass.h"
+#include "repository/MemoryInstance.h"
+
+namespace {
+
+using braigrion::repository::TMemoryNamespace;
+
+double Since(std::chrono::steady_clock::time_point start) {
+    return std::chrono::duration<double>(std::chrono::steady_clock::now() - start).count();
+}
+
+// CPU seconds of the process so far: on a shared machine a fairer measure
+// of each step than the wall clock.
+double CpuSeconds() {
+    rusage usage{};
+    getrusage(RUSAGE_SELF, &usage);
+    return static_cast<double>(usage.ru_utime.tv_sec + usage.ru_stime.tv_sec) +
+           static_cast<double>(usage.ru_utime.tv_usec + usage.ru_stime.tv_usec) / 1e6;
+}
+
+// Deletes every 997th instance and rewrites a string property of every
+// 101st; returns how many of each.
+std::pair<size_t, size_t> Change(TMemoryNamespace& ns) {
+    size_t deleted = 0, changed = 0, n = 0;
+    NORVTKR20::TCIMContext none;
+    for (auto* cls : ns.GetClasses()) {
+        if (cls->IsAssociation()) continue;
+        std::vector<std::string> keys;
+        for (const std::string& key : cls->GetKeyNames()) keys.push_back(key);
+        for (const auto& instance : cls->GetInstances()) {
+            ++n;
+            if (n % 997 == 0) {
+                instance->Delete(none);
+                ++deleted;
+                continue;
+            }
+            if (n % 101 != 0) continue;
+            for (const auto& slot : instance->GetSlots()) {
+                const auto& decl = cls->GetProperties()[slot.fDecl];
+                bool key = false;
+                for (const std::string& k : keys) key = key || braigrion::repository::NamesEqual(k, decl->GetName());
+                if (key || slot.fValue.IsArray() || slot.fValue.GetType() != NORVTKR20::TCIMValue::TCIMType::eString)
+                    continue;
+                instance->GetProperty(decl->GetName(), none)->SetValue(NORVTKR20::TCIMValue("changed"), none);
+                ++changed;
+                break;
+            }
+        }
+    }
+    return {deleted, changed};
+}
+
+}  // namespace
+
+int main(int argc, char** argv) {
+    if (argc != 2) {
+        std::fprintf(stderr, "usage: bench_compare FILE.xml\n");
+        return 2;
+    }
+    const std::vector<std::string> files{argv[1]};
+    double cpu = CpuSeconds();
+    auto start = std::chrono::steady_clock::now();
+    auto earlier = braigrion::repository::LoadCollection(files).fNamespace;
+    const double loadEarlier = Since(start);
+    start = std::chrono::steady_clock::now();
+    auto later = braigrion::repository::LoadCollection(files).fNamespace;
+    const double loadLater = Since(start);
+    const double loadCpu = CpuSeconds() - cpu;
+    const auto changes = Change(*later);
+
+    braigrion::repository::TDeltaSummary summary;
+    cpu = CpuSeconds();
+    start = std::chrono::steady_clock::now();
+    auto records = braigrion::repository::ComputeDeltaRecords({earlier, later}, &summary);
+    const double compare = Since(start);
+    const double compareCpu = CpuSeconds() - cpu;
+
+    rusage usage{};
+    getrusage(RUSAGE_SELF, &usage);
+    std::printf("instances: %zu\n", earlier->GetInstanceCount());
+    std::printf("deleted: %zu\nchanged: %zu\n", changes.first, changes.second);
+    std::printf("classes: %zu\nmissing: %zu\nunique: %zu\nproperty_deltas: %zu\n", summary.fClasses,
+                summary.fMissing, summary.fUnique, summary.fPropertyDeltas);
+    std::printf("load_seconds: %.2f + %.2f\n", loadEarlier, loadLater);
+    std::printf("compare_seconds: %.2f\n", compare);
+    std::printf("compare_over_loads: %.2f\n", compare / (loadEarlier + loadLater));
+    std::printf("cpu_seconds: loads %.2f, compare %.2f (%.2f of the loads)\n", loadCpu, compareCpu,
+                compareCpu / loadCpu);
+    std::printf("peak_rss_mib: %ld\n", usage.ru_maxrss / 1024);
+    return 0;
+}

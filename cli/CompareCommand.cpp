@@ -1,0 +1,151 @@
+// braigrion compare: the delta report of two or more collections of one
+// machine or of several machines.
+#include <CLI/CLI.hpp>
+
+#include <algorithm>
+#include <memory>
+#include <ostream>
+#include <stdexcept>
+
+#include <sys/stat.h>
+#include <dirent.h>
+
+#include <boost/make_shared.hpp>
+
+#include "CollectionLoader.h"
+#include "Commands.h"
+#include "Progress.h"
+#include "ReportDirectory.h"
+#include "RunContext.h"
+#include "THtmlWriter.h"
+#include "TTextWriter.h"
+#include "braigrion/TReport.h"
+#include "repository/CIMXMLWriter.h"
+#include "repository/DeltaRecords.h"
+#include "repository/NamespaceView.h"
+
+namespace braigrion {
+namespace cli {
+
+namespace {
+
+bool IsDirectory(const std::string& path) {
+    struct stat st;
+    return ::stat(path.c_str(), &st) == 0 && S_ISDIR(st.st_mode);
+}
+
+}  // namespace
+
+std::vector<std::string> CollectionFiles(const std::string& argument) {
+    std::vector<std::string> files;
+    if (IsDirectory(argument)) {
+        DIR* dir = ::opendir(argument.c_str());
+        if (!dir) throw TInputError(argument + ": cannot read the directory");
+        while (dirent* entry = ::readdir(dir)) {
+            const std::string name = entry->d_name;
+            if (name.size() > 4 && name.compare(name.size() - 4, 4, ".xml") == 0) {
+                files.push_back(argument + "/" + name);
+            }
+        }
+        ::closedir(dir);
+        std::sort(files.begin(), files.end());
+        if (files.empty()) throw TInputError(argument + ": no .xml file in the directory");
+        return files;
+    }
+    std::string::size_type start = 0;
+    while (start <= argument.size()) {
+        std::string::size_type end = argument.find(':', start);
+        if (end == std::string::npos) end = argument.size();
+        if (end == start) throw TInputError("'" + argument + "': an empty file name in a collection");
+        files.push_back(argument.substr(start, end - start));
+        start = end + 1;
+    }
+    return files;
+}
+
+CLI::App* AddCompareCommand(CLI::App& app, TCompareOptions& options) {
+    CLI::App* command =
+        app.add_subcommand("compare", "Write the delta report of two or more collections into a directory");
+    command->add_option("collections", options.fCollections,
+                        "One argument per collection: a directory (its .xml files) or FILE[:FILE...]")
+        ->required()
+        ->type_name("COLLECTION");
+    command->add_option("-o,--output", options.fOutput, "Directory of the report (replaced when it holds one)")
+        ->required()
+        ->type_name("DIR");
+    command->add_option("--format", options.fFormat, "Output format")
+        ->check(CLI::IsMember({"html", "text"}))
+        ->capture_default_str();
+    command->add_option("--records", options.fRecords,
+                        "Read the delta records from FILE instead of computing them")
+        ->type_name("FILE");
+    command->add_option("--save-records", options.fSaveRecords, "Also save the computed delta records as CIM-XML")
+        ->type_name("FILE");
+    command->add_flag("--force", options.fForce, "Replace DIR even when it is not an earlier report");
+    command->add_flag("-q,--quiet", options.fQuiet, "No progress on standard error");
+    AddRunOptions(*command, options.fRun);
+    command->footer(
+        "The first collection is the baseline. Instances match by the keys of their object paths, leaving out\n"
+        "keys that name the host. The report is written beside DIR and moved into place when complete; the\n"
+        "path of the report's index is printed on standard output.");
+    return command;
+}
+
+int RunCompare(const TCompareOptions& options, std::ostream& out, std::ostream& err, bool progressToErr) {
+    // Everything the user gave is checked before anything is written.
+    SetUpLog(options.fRun);
+    if (options.fCollections.size() < 2) throw TInputError("compare needs at least two collections");
+    if (!options.fRecords.empty() && !options.fSaveRecords.empty()) {
+        throw TInputError("--records and --save-records exclude each other");
+    }
+    std::vector<boost::shared_ptr<repository::TMemoryNamespace>> collections;
+    for (const std::string& argument : options.fCollections) {
+        repository::TLoadResult loaded = LoadFiles(CollectionFiles(argument));
+        for (const std::string& warning : loaded.fWarnings) err << "braigrion: warning: " << warning << '\n';
+        loaded.fNamespace->SetName(argument);
+        collections.push_back(loaded.fNamespace);
+    }
+    boost::shared_ptr<repository::TMemoryNamespace> records;
+    if (!options.fRecords.empty()) {
+        records = LoadFiles({options.fRecords}).fNamespace;
+        if (!records->FindClass("ORVSG_DeltaClass")) {
+            throw TInputError(options.fRecords + ": holds no delta records (no ORVSG_DeltaClass)");
+        }
+    }
+    TReportDirectory directory(options.fOutput, options.fForce);
+
+    if (!records) {
+        records = repository::ComputeDeltaRecords(collections);
+        if (!options.fSaveRecords.empty()) repository::WriteCollectionFile(*records, options.fSaveRecords);
+    }
+    auto view = boost::make_shared<repository::TNamespaceView>(collections, records);
+
+    std::unique_ptr<backends::TBackendWriter> writer;
+    std::string index;
+    if (options.fFormat == "text") {
+        writer.reset(new backends::TTextWriter());
+        index = "index.txt";
+    } else {
+        writer.reset(new backends::THtmlWriter());
+        index = "index.html";
+    }
+
+    TContextMap context = MakeContext(options.fRun);
+    for (const auto& key : view->MakeContext()) context[key.first] = key.second;
+    TReport report(view, context, directory.WorkPath());
+    {
+        TProgressLine progress(err, progressToErr && !options.fQuiet);
+        report.SetPageObserver([&progress](size_t number, size_t total, const std::string& page) {
+            progress.Page(number, total, page);
+        });
+        report.Write(writer.get(), context);
+    }
+    if (!writer->GetFailure().empty()) throw std::runtime_error(writer->GetFailure());
+
+    directory.Commit(options.fFormat);
+    out << directory.TargetPath() << "/" << index << '\n';
+    return 0;
+}
+
+}  // namespace cli
+}  // namespace braigrion
