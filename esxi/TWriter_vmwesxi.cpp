@@ -78,11 +78,10 @@ void TWriter_vmwesxi::WriteCustomSystemOverview(TReportParameters params) {
                 }
             } else if (className == "VMware_HypervisorSoftwareIdentity") {
                 // The hypervisor is shown from the software identities that
-                // name it; the definition's columns and filters stay.
-                instances = TWriterUtil::GetInstances(fNamespace, reportClass);
+                // name it, whichever class holds them; the definition's
+                // columns and filters stay.
                 reportClass.SetClass("CIM_SoftwareIdentity");
                 reportClass.SetTitle("Operating System");
-                instances.clear();
                 for (const TInstancePtr& instance : TWriterUtil::GetInstances(fNamespace, reportClass)) {
                     if (HasKey(instance, "VMware ESX", "VersionString")) instances.push_back(instance);
                 }

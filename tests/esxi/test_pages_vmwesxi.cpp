@@ -9,6 +9,7 @@
 #include <fstream>
 #include <map>
 #include <sstream>
+#include <stdexcept>
 #include <string>
 #include <vector>
 
@@ -143,6 +144,24 @@ TEST(BackendsVmwesxi, CollectedValuesAreEscaped) {
     EXPECT_NE(std::string::npos, ReadFile(text / "index.txt").find("Hardware Inventory"));
     fs::remove_all(html);
     fs::remove_all(text);
+}
+
+// A page that fails ends the sequence before the index is written; the
+// back-end tells the command so, and the command refuses the report.
+class TFailingHtmlWriter : public backends::THtmlWriter_vmwesxi {
+public:
+    void WriteEmulex(TReportParameters) override { throw std::runtime_error("page failed"); }
+};
+
+TEST(BackendsVmwesxi, AReportStoppedByAFailingPageIsNotEnded) {
+    const fs::path dir = TempDir("stopped");
+    TFailingHtmlWriter writer;
+    TReport_vmwesxi(repository::LoadCollection(SampleFiles()).fNamespace, TContext(), dir.string())
+        .Write(&writer, TContext());
+    EXPECT_FALSE(writer.IsEnded());
+    EXPECT_TRUE(fs::exists(dir / "qlogic.html"));
+    EXPECT_FALSE(fs::exists(dir / "index.html"));
+    fs::remove_all(dir);
 }
 
 // The command: run it and capture its standard output.
