@@ -198,8 +198,11 @@ void TWriter_vmwesxi::WriteTable(TReportClass reportClass, std::vector<TInstance
     if (instances.empty()) {
         // Only a table that must stand without instances comes here: its
         // headings alone, labelled on the class when the collection has it.
+        if (rowReport) {
+            Trace("TWriter_vmwesxi::WriteTable -- Exiting");
+            return;
+        }
         TTable table = LayOutGrid(reportClass, 0);
-        if (rowReport) return;
         boost::shared_ptr<ICIMClass> cls;
         try {
             cls = fNamespace->GetClass(reportClass.GetClass(), empty);

@@ -85,13 +85,6 @@ TEST(DriverVmwesxi, AFailingPageEndsTheSequenceWithoutEndingTheReport) {
     EXPECT_EQ(static_cast<int>(log.Messages().size()) - 1, log.IndexOf("TWriter_vmwesxi::Write -- Exiting "));
 }
 
-TEST(DriverVmwesxi, ANullWriterIsRefused) {
-    TLogCapture log;
-    TReport_vmwesxi report(TRepoBuilder().Namespace(), TContext(), "out");
-    report.Write(nullptr, TContext());
-    EXPECT_EQ(0, log.LevelOf("TReport_vmwesxi::Write -- Null-Pointor exception: Parameter (TWriter_vmwesxi *writer == NULL)"));
-}
-
 // The error log is indexed without data in the default mode, tables or not.
 TEST(DriverVmwesxi, ErrorLogHasNoDataInTheDefaultModeOnly) {
     const char* const log = "ORVSG_TKRLogRecord RecordID=uint32:1 Source=\"Collector\" Message=\"started\"";
@@ -209,13 +202,6 @@ TEST_F(WriterFrameVmwesxi, PropertyValuesAreEscapedElementByElement) {
     EXPECT_EQ("!x16 / !x8", fWriter.GetPropertyValue(fCard, "Slots", " / "));
     EXPECT_EQ("2024-03-11 14:15:02", fWriter.GetPropertyValue(fCard, "Installed", " "));
     EXPECT_EQ("", fWriter.GetPropertyValue(fCard, "Missing", " "));
-}
-
-TEST_F(WriterFrameVmwesxi, HasKeyLooksForTheTextInTheProperty) {
-    EXPECT_TRUE(fWriter.HasKey(fCard, "Riser", "Name"));
-    EXPECT_FALSE(fWriter.HasKey(fCard, "riser", "Name"));
-    EXPECT_FALSE(fWriter.HasKey(fCard, "Riser", "Missing"));
-    EXPECT_FALSE(fWriter.HasKey(boost::shared_ptr<NORVTKR20::ICIMInstance>(), "Riser", "Name"));
 }
 
 TEST_F(WriterFrameVmwesxi, SwitchUUIDReversesTheBytesOfTheFirstThreeGroups) {

@@ -111,13 +111,13 @@ TEST(KMCConfigVmwesxi, OnlyDHCPEndpointsAndOneTablePerSettingAreShown) {
     EXPECT_TRUE(Has(page, "10.0.0.5")) << page;
     EXPECT_FALSE(Has(page, "10.0.0.6")) << page;
     EXPECT_FALSE(Has(page, "10.0.0.7")) << page;
-    EXPECT_TRUE(Has(page, "\"labmon\"") && Has(page, "\"public\"")) << page;
-    size_t snmpTitles = 0;
-    for (size_t at = page.find("\"SNMP Community\""); at != std::string::npos;
-         at = page.find("\"SNMP Community\"", at + 1)) {
-        ++snmpTitles;
-    }
-    EXPECT_EQ(2u, snmpTitles) << page;
+    // One titled table per community.
+    EXPECT_TRUE(Has(page, "WriteTableTitle(\"SNMP Community\", false, false)\n"
+                          "WriteTableGrid(grid 2x2 width=70 widths=[40,60] rowheaders)\n"
+                          "  | \"CommunityString\" \"labmon\"\n")) << page;
+    EXPECT_TRUE(Has(page, "WriteTableTitle(\"SNMP Community\", false, false)\n"
+                          "WriteTableGrid(grid 2x2 width=70 widths=[40,60] rowheaders)\n"
+                          "  | \"CommunityString\" \"public\"\n")) << page;
     EXPECT_TRUE(Has(page, "WriteIndexEntry(\"SPConfig\", \"KMC Configuration\", true)")) << page;
 }
 
