@@ -40,7 +40,8 @@ std::string SensorReading(const TInstancePtr& sensor) {
         std::ostringstream text;
         text << value;
         return text.str();
-    } catch (const TTKRException&) {
+    } catch (...) {
+        // A missing, null or non-numeric value reads nothing.
         return std::string();
     }
 }
@@ -52,8 +53,8 @@ bool IsDhcpOrigin(const TInstancePtr& endpoint) {
         TCIMContext context;
         const NORVTKR20::TCIMValue& origin = endpoint->GetProperty("AddressOrigin", context)->GetValue(context);
         return !origin.IsNull() && static_cast<unsigned short>(origin) == 4;
-    } catch (const TTKRException&) {
-        return false;
+    } catch (...) {
+        return false;  // no origin, or not a number: no DHCP address
     }
 }
 

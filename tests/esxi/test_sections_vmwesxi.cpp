@@ -46,6 +46,8 @@ TEST(EnvironmentalsVmwesxi, ReadingIsScaledByTheUnitModifier) {
         {"CurrentReading=sint32:331 UnitModifier=sint32:-2", "3.31"},
         {"CurrentReading=sint32:12 UnitModifier=sint32:3", "12000"},
         {"CurrentReading=sint32:42", ""},
+        {"CurrentReading=null:sint32 UnitModifier=sint32:0", ""},
+        {"CurrentReading=\"high\" UnitModifier=sint32:0", ""},
     };
     for (const TCase& c : cases) {
         const std::string page = WriteSection(&TWriter_vmwesxi::WriteEnvironmentalsPreferred,
@@ -104,6 +106,7 @@ TEST(KMCConfigVmwesxi, OnlyDHCPEndpointsAndOneTablePerSettingAreShown) {
         "CIM_IPProtocolEndpoint Name=\"dhcp\" IPv4Address=\"10.0.0.5\" AddressOrigin=uint16:4\n"
         "CIM_IPProtocolEndpoint Name=\"static\" IPv4Address=\"10.0.0.6\" AddressOrigin=uint16:3\n"
         "CIM_IPProtocolEndpoint Name=\"other\" IPv4Address=\"10.0.0.7\" AddressOrigin=uint16:14\n"
+        "CIM_IPProtocolEndpoint Name=\"odd\" IPv4Address=\"10.0.0.8\" AddressOrigin=\"4 (DHCP)\"\n"
         "CIM_SNMPCommunityString CommunityString=\"public\" SystemName=\"sp\"\n"
         "CIM_SNMPCommunityString CommunityString=\"labmon\" SystemName=\"sp\"");
     EXPECT_TRUE(Has(page, "WriteTableTitle(\"SP:DNS:1\", false, false)")) << page;
@@ -111,6 +114,7 @@ TEST(KMCConfigVmwesxi, OnlyDHCPEndpointsAndOneTablePerSettingAreShown) {
     EXPECT_TRUE(Has(page, "10.0.0.5")) << page;
     EXPECT_FALSE(Has(page, "10.0.0.6")) << page;
     EXPECT_FALSE(Has(page, "10.0.0.7")) << page;
+    EXPECT_FALSE(Has(page, "10.0.0.8")) << page;
     // One titled table per community.
     EXPECT_TRUE(Has(page, "WriteTableTitle(\"SNMP Community\", false, false)\n"
                           "WriteTableGrid(grid 2x2 width=70 widths=[40,60] rowheaders)\n"
