@@ -62,18 +62,32 @@ TTable::TCell& CellOf(TTable& table, bool rowReport, int index, int column) {
 
 }  // namespace
 
+bool TWriter_vmwesxi::HasNoTimePrecision(ICIMProperty& property) {
+    TCIMContext context;
+    boost::shared_ptr<const NORVTKR20::ICIMPropertyDecl> declaration = property.GetDeclaration(context);
+    if (fCachingDates) {
+        for (const auto& known : fDateQualifiers) {
+            if (known.first == declaration) return known.second;
+        }
+    }
+    bool found = true;
+    try {
+        bool propagated = false;
+        declaration->GetQualifier("NOTIMEPRECISION", propagated, context);
+    } catch (const TTKRException& ex) {
+        // Its absence is an answer; any other failure is passed on.
+        if (!IsNotFound(ex)) throw TTKRException(ex.fStatusCode);
+        found = false;
+    }
+    if (fCachingDates) fDateQualifiers.push_back(std::make_pair(declaration, found));
+    return found;
+}
+
 std::string TWriter_vmwesxi::GetValueFromProperty(TPropertyPtr property, std::string separator, bool useMappedText) {
     try {
         TCIMContext context;
         if (property->GetType(context) == TCIMValue::TCIMType::eDateTime) {
-            bool noTimePrecision = true;
-            try {
-                bool propagated = false;
-                property->GetDeclaration(context)->GetQualifier("NOTIMEPRECISION", propagated, context);
-            } catch (const TTKRException& ex) {
-                if (!IsNotFound(ex)) throw TTKRException(ex.fStatusCode);
-                noTimePrecision = false;
-            }
+            const bool noTimePrecision = HasNoTimePrecision(*property);
             const TCIMValue& value = useMappedText ? property->GetValue() : property->GetValue(context);
             return TWriterUtil::GetDateTime(value, noTimePrecision);
         }
@@ -134,6 +148,15 @@ void TWriter_vmwesxi::WriteTable(TReportClass reportClass, std::vector<TInstance
     Trace("TWriter_vmwesxi::WriteTable -- Entering");
     Trace("TWriter_vmwesxi::WriteTable -- Current table title = " + reportClass.GetTitle());
     reportClass.Validate();
+    // The declarations cannot change while one table is written.
+    struct TDateCache {
+        explicit TDateCache(TWriter_vmwesxi& writer) : fWriter(writer) { fWriter.fCachingDates = true; }
+        ~TDateCache() {
+            fWriter.fCachingDates = false;
+            fWriter.fDateQualifiers.clear();
+        }
+        TWriter_vmwesxi& fWriter;
+    } dateCache(*this);
     const std::vector<TReportProperty>& columns = reportClass.GetProperties();
     std::vector<std::string> separators;
     for (const TReportProperty& column : columns) separators.push_back(GetSeparatorText(column.GetArrayValueSeparator()));

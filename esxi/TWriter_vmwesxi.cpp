@@ -26,7 +26,7 @@ const char kErrorLogName[] = "TKR Error Log";
 
 }  // namespace
 
-TWriter_vmwesxi::TWriter_vmwesxi() : fMode("default") {}
+TWriter_vmwesxi::TWriter_vmwesxi() : fMode("default"), fCachingDates(false) {}
 
 TWriter_vmwesxi::~TWriter_vmwesxi() {}
 

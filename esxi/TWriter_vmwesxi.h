@@ -9,6 +9,7 @@
 
 #include <map>
 #include <string>
+#include <utility>
 #include <vector>
 
 #include <boost/shared_ptr.hpp>
@@ -157,6 +158,14 @@ protected:
     std::string fMode;        // "default" or "luz"
 
 private:
+    // Whether a date property's declaration carries "NOTIMEPRECISION".
+    // While a table is written the answer is kept per declaration: an
+    // absent qualifier answers by an exception, dear on every cell.
+    bool HasNoTimePrecision(NORVTKR20::ICIMProperty& property);
+
+    bool fCachingDates;
+    std::vector<std::pair<boost::shared_ptr<const NORVTKR20::ICIMPropertyDecl>, bool>> fDateQualifiers;
+
     TWriter_vmwesxi(const TWriter_vmwesxi&) = delete;
     TWriter_vmwesxi& operator=(const TWriter_vmwesxi&) = delete;
 };
