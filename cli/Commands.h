@@ -37,6 +37,7 @@ struct TReportOptions {
     std::vector<std::string> fFiles;
     std::string fOutput;
     std::string fFormat = "html";  // "html" or "text"
+    std::string fStack = "auto";   // "auto", "base" or "esxi": which report the collection gets
     bool fForce = false;           // replace a directory that is not a report
     bool fQuiet = false;           // no progress
     TRunOptions fRun;

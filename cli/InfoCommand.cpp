@@ -6,6 +6,7 @@
 
 #include "CollectionLoader.h"
 #include "Commands.h"
+#include "TReport_vmwesxi.h"
 #include "braigrion/TReportParametersBuilder.h"
 #include "repository/MemoryClass.h"
 #include "tkrcore/tkrcore.h"
@@ -56,6 +57,7 @@ int RunInfo(const TInfoOptions& options, std::ostream& out, std::ostream& err) {
     Fact(out, "Serial number", NORVTKR20::TCIMSchemaHelper::GetRawSerialNumberString(ns, context));
     Fact(out, "OS version", NORVTKR20::TCIMSchemaHelper::GetOperatingSystemVersion(ns));
     Fact(out, "OS type", OSTypeName(TReportParametersBuilder(ns, "default", false).GetOSType()));
+    Fact(out, "Report", TReport_vmwesxi::IsESXiCollection(ns) ? "ESXi host (its own page list)" : "base");
 
     std::vector<repository::TMemoryClass*> classes = ns->GetClasses();
     std::sort(classes.begin(), classes.end(), [](repository::TMemoryClass* a, repository::TMemoryClass* b) {

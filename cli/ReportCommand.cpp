@@ -12,7 +12,10 @@
 #include "ReportDirectory.h"
 #include "RunContext.h"
 #include "THtmlWriter.h"
+#include "THtmlWriter_vmwesxi.h"
+#include "TReport_vmwesxi.h"
 #include "TTextWriter.h"
+#include "TTextWriter_vmwesxi.h"
 #include "braigrion/TReport.h"
 
 namespace braigrion {
@@ -50,6 +53,10 @@ CLI::App* AddReportCommand(CLI::App& app, TReportOptions& options) {
     command->add_option("--format", options.fFormat, "Output format")
         ->check(CLI::IsMember({"html", "text"}))
         ->capture_default_str();
+    command->add_option("--stack", options.fStack,
+                        "Report for a base collection or an ESXi host; auto tells them apart by their classes")
+        ->check(CLI::IsMember({"auto", "base", "esxi"}))
+        ->capture_default_str();
     command->add_flag("--force", options.fForce, "Replace DIR even when it is not an earlier report");
     command->add_flag("-q,--quiet", options.fQuiet, "No progress on standard error");
     AddRunOptions(*command, options.fRun);
@@ -61,6 +68,31 @@ CLI::App* AddReportCommand(CLI::App& app, TReportOptions& options) {
     return command;
 }
 
+namespace {
+
+// The report of an ESXi host, written into `workPath`. A failure to write
+// output is thrown, as for a base report.
+template <class TBackend>
+void WriteESXiReport(boost::shared_ptr<NORVTKR20::ICIMNamespace> ns, const TContextMap& context,
+                     const std::string& workPath) {
+    TBackend writer;
+    TReport_vmwesxi report(ns, context, workPath);
+    report.Write(&writer, context);
+    if (!writer.GetFailure().empty()) throw std::runtime_error(writer.GetFailure());
+    if (!writer.IsEnded()) throw std::runtime_error("the ESXi report stopped before its last page (see --log)");
+}
+
+void RunESXiReport(boost::shared_ptr<NORVTKR20::ICIMNamespace> ns, const TContextMap& context,
+                   const std::string& format, const std::string& workPath) {
+    if (format == "text") {
+        WriteESXiReport<backends::TTextWriter_vmwesxi>(ns, context, workPath);
+    } else {
+        WriteESXiReport<backends::THtmlWriter_vmwesxi>(ns, context, workPath);
+    }
+}
+
+}  // namespace
+
 int RunReport(const TReportOptions& options, std::ostream& out, std::ostream& err, bool progressToErr) {
     // Everything the user gave is checked before anything is written.
     SetUpLog(options.fRun);
@@ -68,18 +100,25 @@ int RunReport(const TReportOptions& options, std::ostream& out, std::ostream& er
     for (const std::string& warning : loaded.fWarnings) err << "braigrion: warning: " << warning << '\n';
     TReportDirectory directory(options.fOutput, options.fForce);
 
+    TContextMap context = MakeContext(options.fRun);
+    const std::string index = options.fFormat == "text" ? "index.txt" : "index.html";
+    const bool esxi = options.fStack == "esxi" ||
+                      (options.fStack == "auto" && TReport_vmwesxi::IsESXiCollection(loaded.fNamespace));
+    if (esxi) {
+        RunESXiReport(loaded.fNamespace, context, options.fFormat, directory.WorkPath());
+        directory.Commit(options.fFormat);
+        out << directory.TargetPath() << "/" << index << '\n';
+        return 0;
+    }
+
     std::unique_ptr<backends::TBackendWriter> writer;
-    std::string index;
     if (options.fFormat == "text") {
         writer.reset(new backends::TTextWriter());
-        index = "index.txt";
     } else {
         writer.reset(new backends::THtmlWriter());
-        index = "index.html";
     }
 
     ApplyLogLinkOptions(options.fRun, *writer);
-    TContextMap context = MakeContext(options.fRun);
     TReport report(loaded.fNamespace, context, directory.WorkPath());
     {
         TProgressLine progress(err, progressToErr && !options.fQuiet);

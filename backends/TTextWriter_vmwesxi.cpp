@@ -1,0 +1,9 @@
+#include "TTextWriter_vmwesxi.h"
+
+namespace braigrion {
+namespace backends {
+
+template class TBackendWriter_vmwesxi<TTextWriter>;
+
+}  // namespace backends
+}  // namespace braigrion
