@@ -1,5 +1,7 @@
 #include "THtmlWriter.h"
 
+#include <algorithm>
+
 #include "Assets.h"
 #include "HtmlText.h"
 #include "braigrion/ReportDefinition.h"
@@ -11,6 +13,11 @@ using namespace TKR_REPORT_DEFINITION;
 
 namespace {
 
+// Stands in a page's head until the page's title is known.
+const char kTitlePlaceholder[] = "<title>Report page</title>";
+// The title of the table that the navigation's highlights link points at.
+const char kHighlightsTitle[] = "Report Highlights";
+
 std::string Percent(int width) {
     return width > 0 ? std::to_string(width) + "%" : std::string();
 }
@@ -19,37 +26,101 @@ bool IsSwitchText(const std::string& text) {
     return text.compare(0, 4, " - [") == 0;
 }
 
+// The head of a document page, up to and with the opening of its body.
+std::string DocumentHead(const std::string& stem) {
+    const std::string page = EscapeHtml(stem);
+    return "<!DOCTYPE html>\n<html lang=\"en\">\n<head>\n<meta charset=\"utf-8\">\n"
+           "<meta name=\"viewport\" content=\"width=device-width, initial-scale=1\">\n" +
+           std::string(kTitlePlaceholder) +
+           "\n<link href=\"global.css\" rel=\"stylesheet\">\n"
+           "<script src=\"tkr_sort.js\" defer></script>\n</head>\n<body data-page=\"" +
+           page +
+           "\">\n<nav class=\"pagetools\" aria-label=\"Page\">"
+           "<a class=\"backtoindex\" href=\"index.html#" +
+           page +
+           "\" target=\"_top\">&larr; Report index</a>"
+           "<a class=\"openalone\" href=\"" +
+           page +
+           ".html\" target=\"_blank\" rel=\"noopener\">Open this page alone</a>"
+           "<button type=\"button\" id=\"printpage\">Print</button></nav>\n<main>\n";
+}
+
+// A cell of a big table's data: its mark-up, or [mark-up, tooltip, mono]
+// when it has either. Text for a script element: "<" never stands in it.
+std::string JsonString(const std::string& text) {
+    std::string out = "\"";
+    for (unsigned char c : text) {
+        switch (c) {
+            case '"': out += "\\\""; break;
+            case '\\': out += "\\\\"; break;
+            case '\n': out += "\\n"; break;
+            case '\r': out += "\\r"; break;
+            case '\t': out += "\\t"; break;
+            case '<': out += "\\u003c"; break;
+            case '>': out += "\\u003e"; break;
+            case '&': out += "\\u0026"; break;
+            default:
+                if (c < 0x20) {
+                    static const char kHex[] = "0123456789abcdef";
+                    out += "\\u00";
+                    out += kHex[c >> 4];
+                    out += kHex[c & 15];
+                } else {
+                    out += static_cast<char>(c);
+                }
+        }
+    }
+    return out + "\"";
+}
+
 }  // namespace
 
 THtmlWriter::THtmlWriter() : THtmlWriter(TKR_REPORT_DEFINITION::TKR_WRITER_TYPE_HTML) {}
 
 THtmlWriter::THtmlWriter(const std::string& writerType) : TBackendWriter(writerType), fPageHasSortable(false) {}
 
+void THtmlWriter::Initialize(TNamespacePtr ns, TContext context, const std::string& outputPath) {
+    TBackendWriter::Initialize(ns, context, outputPath);
+    fIdentity = ReadReportIdentity(ns);
+    fHighlightsPage.clear();
+    fHighlightsAnchor.clear();
+}
+
 std::string THtmlWriter::PageHeader(bool sortHeader) const {
+    if (WritesDocuments()) return DocumentHead(fPageStem);
     return sortHeader ? kHtmlSortHeaderUTF8 + kHtmlSortScript : kHtmlHeaderUTF8;
 }
 
 void THtmlWriter::WritePageHeader() {
     fPageHasSortable = false;
+    fPageAnchors.clear();
     fPage += PageHeader(fSortScriptAsked);
 }
 
 void THtmlWriter::WritePageFooter() {
     if (fPageTables == 0) fPage += kNoInfoText1 + " " + kNoInfoText2 + " " + kNoInfoText3 + "\n";
     // Sortable tables on a page that did not ask for the script get it here.
-    if (fPageHasSortable && !fSortScriptAsked) fPage += kHtmlSortScript;
-    fPage += "</body>\n" + kHtmlFooter;
-    fFooterWritten = true;
+    if (fPageHasSortable && !fSortScriptAsked && !WritesDocuments()) fPage += kHtmlSortScript;
+    FinishAbandonedPage();
 }
 
 void THtmlWriter::FinishAbandonedPage() {
+    if (WritesDocuments()) fPage += "</main>\n";
     fPage += "</body>\n" + kHtmlFooter;
     fFooterWritten = true;
 }
 
 void THtmlWriter::WriteTitle(const std::string& title, const std::string& target, const std::string& text) {
     std::string heading = EscapeHtml(title);
-    fPage += "<title>" + heading + "</title>\n" + kReporTitleBeg + heading;
+    size_t placeholder = fPage.find(kTitlePlaceholder);
+    if (placeholder != std::string::npos) {
+        // The window names the page and the machine.
+        std::string windowTitle = heading + " \u2013 " + EscapeHtml(fIdentity.Title());
+        fPage.replace(placeholder, sizeof(kTitlePlaceholder) - 1, "<title>" + windowTitle + "</title>");
+        fPage += "<div class=\"pageheader\" role=\"heading\" aria-level=\"1\">" + heading;
+    } else {
+        fPage += "<title>" + heading + "</title>\n" + kReporTitleBeg + heading;
+    }
     std::string href;
     if (!target.empty()) {
         href = SafeHref(target, true);
@@ -82,14 +153,73 @@ void THtmlWriter::WriteTableBreak() {
     fPage += "<br>\n";
 }
 
+std::string THtmlWriter::TitleAnchor(const std::string& title) {
+    std::string anchor;
+    for (char c : title) {
+        if ((c >= 'a' && c <= 'z') || (c >= '0' && c <= '9')) {
+            anchor += c;
+        } else if (c >= 'A' && c <= 'Z') {
+            anchor += static_cast<char>(c - 'A' + 'a');
+        } else if (!anchor.empty() && anchor.back() != '-') {
+            anchor += '-';
+        }
+    }
+    while (!anchor.empty() && anchor.back() == '-') anchor.pop_back();
+    if (anchor.empty()) anchor = "table";
+    std::string unique = anchor;
+    for (int n = 2; std::find(fPageAnchors.begin(), fPageAnchors.end(), unique) != fPageAnchors.end(); ++n) {
+        unique = anchor + "-" + std::to_string(n);
+    }
+    fPageAnchors.push_back(unique);
+    return unique;
+}
+
 void THtmlWriter::WriteTableTitle(const std::string& title, const bool& subTitle, const bool& /*unused*/) {
-    fPage += (subTitle ? kTableSubTitleBeg : kTableTitleBeg) + EscapeHtml(title) + "</div>\n";
+    if (!WritesDocuments()) {
+        fPage += (subTitle ? kTableSubTitleBeg : kTableTitleBeg) + EscapeHtml(title) + "</div>\n";
+        return;
+    }
+    const std::string anchor = TitleAnchor(title);
+    if (!subTitle && fHighlightsPage.empty() && title == kHighlightsTitle) {
+        fHighlightsPage = fPageStem;
+        fHighlightsAnchor = anchor;
+    }
+    fPage += std::string(subTitle ? "<div class=\"tablesubtitle\" role=\"heading\" aria-level=\"3\""
+                                  : "<br><div class=\"tabletitle\" role=\"heading\" aria-level=\"2\"") +
+             " id=\"" + anchor + "\">" + EscapeHtml(title) + "</div>\n";
+}
+
+void THtmlWriter::WriteTableData(const TTable& table, int firstBodyRow) {
+    fPage += "<script type=\"application/json\" id=\"t" + std::to_string(fTableCounter) + "-rows\">{\"rowHeaders\":" +
+             (table.fRowHeaders ? "true" : "false") + ",\"rows\":[";
+    for (int r = firstBodyRow; r < table.fRows; ++r) {
+        fPage += r == firstBodyRow ? "[" : ",\n[";
+        for (int c = 0; c < table.fCols; ++c) {
+            const TTable::TCell& cell = table.Cell(r, c);
+            std::string html = cell.flags[kFinalText] ? cell.text : SanitizeCellMarkup(cell.text);
+            if (c > 0) fPage += ",";
+            if (cell.monospaced || !cell.rawText.empty()) {
+                fPage += "[" + JsonString(html) + "," + JsonString(EscapeHtml(cell.rawText)) + "," +
+                         (cell.monospaced ? "1" : "0") + "]";
+            } else {
+                fPage += JsonString(html);
+            }
+        }
+        fPage += "]";
+    }
+    fPage += "]}</script>\n";
 }
 
 void THtmlWriter::WriteTableGrid(TTable& table) {
     ++fPageTables;
     ++fTableCounter;
-    bool sortable = table.fSortable && table.fColumnHeaders && table.fRows > 1;
+    const bool documents = WritesDocuments();
+    const int firstBodyRow = table.fColumnHeaders ? 1 : 0;
+    const int bodyRows = table.fRows - firstBodyRow;
+    // A table of one row has nothing to sort.
+    bool sortable = table.fSortable && table.fColumnHeaders && bodyRows > 1;
+    bool asData = documents && sortable && bodyRows > kWholeTableRows;
+    for (int r = firstBodyRow; asData && r < table.fRows; ++r) asData = !table.Cell(r, 0).flags[kSpansRow];
     fPageHasSortable = fPageHasSortable || sortable;
     std::string& out = fPage;
     out += table.fRowHeaders ? kRowTableHeaderBeg : kColTableHeaderBeg;
@@ -100,18 +230,19 @@ void THtmlWriter::WriteTableGrid(TTable& table) {
     auto cellText = [](const TTable::TCell& cell) {
         return cell.flags[kFinalText] ? cell.text : SanitizeCellMarkup(cell.text);
     };
-    int firstBodyRow = 0;
+    auto headerCell = [&](const TTable::TCell& cell, int c, const char* scope, bool button) {
+        out += "<th scope=\"" + std::string(scope) + "\" class=\"tableheader\" width=\"" +
+               Percent(table.fColumnWidths[static_cast<size_t>(c)]) + kTableHeaderElementMid;
+        out += button ? "<button type=\"button\" class=\"sortbutton\">" + cellText(cell) + "</button>" : cellText(cell);
+        out += kTableHeaderElementEnd;
+    };
     if (table.fColumnHeaders) {
         out += "<thead>" + kTableRowBeg + kTableRowMid;
-        for (int c = 0; c < table.fCols; ++c) {
-            out += kTableHeaderElementBegin + Percent(table.fColumnWidths[static_cast<size_t>(c)]) +
-                   kTableHeaderElementMid + cellText(table.Cell(0, c)) + kTableHeaderElementEnd;
-        }
+        for (int c = 0; c < table.fCols; ++c) headerCell(table.Cell(0, c), c, "col", sortable && documents);
         out += kTableRowEnd + "</thead>\n";
-        firstBodyRow = 1;
     }
     out += "<tbody>\n";
-    for (int r = firstBodyRow; r < table.fRows; ++r) {
+    for (int r = asData ? table.fRows : firstBodyRow; r < table.fRows; ++r) {
         const TTable::TCell& first = table.Cell(r, 0);
         if (first.flags[kSpansRow]) {
             out += kTableRowBeg + " class=\"spanrow\"" + kTableRowMid + "<td colspan=\"" + std::to_string(table.fCols) +
@@ -122,8 +253,7 @@ void THtmlWriter::WriteTableGrid(TTable& table) {
         for (int c = 0; c < table.fCols; ++c) {
             const TTable::TCell& cell = table.Cell(r, c);
             if ((c == 0 && table.fRowHeaders) || cell.flags[kHeaderCell]) {
-                out += kTableHeaderElementBegin + Percent(table.fColumnWidths[static_cast<size_t>(c)]) +
-                       kTableHeaderElementMid + cellText(cell) + kTableHeaderElementEnd;
+                headerCell(cell, c, "row", false);
                 continue;
             }
             out += "<td";
@@ -134,6 +264,7 @@ void THtmlWriter::WriteTableGrid(TTable& table) {
         out += kTableRowEnd + "\n";
     }
     out += "</tbody>\n" + kTableFooter + "\n";
+    if (asData) WriteTableData(table, firstBodyRow);
 }
 
 std::string THtmlWriter::EscapeText(std::string text) {
@@ -165,24 +296,41 @@ void THtmlWriter::SavePage(const std::string& stem, const std::string& text) {
 }
 
 std::string THtmlWriter::NavigationPage() const {
-    std::string out = kHtmlIndexHeader;
-    out += "<TR><TD class=\"brand\">Server report</TD></TR>\n";
+    std::string out =
+        "<!DOCTYPE html>\n<html lang=\"en\">\n<head>\n<meta charset=\"utf-8\">\n<title>Navigation</title>\n"
+        "<link href=\"global.css\" rel=\"stylesheet\">\n<script src=\"tkr_sort.js\" defer></script>\n</head>\n"
+        "<body class=\"navigation\">\n<nav id=\"navbar\" aria-label=\"Report pages\">\n";
+    // The machine, and what to look at first.
+    out += "<div class=\"brand\">\n";
+    const TReportIdentity& id = fIdentity;
+    out += "<h1 class=\"machine\">" + EscapeHtml(id.fHost.empty() ? id.Title() : id.fHost) + "</h1>\n";
+    if (!id.fModel.empty()) out += "<div class=\"fact\">" + EscapeHtml(id.fModel) + "</div>\n";
+    if (!id.fSerial.empty()) out += "<div class=\"fact\">Serial " + EscapeHtml(id.fSerial) + "</div>\n";
+    if (!id.fDate.empty()) out += "<div class=\"fact\">Collected " + EscapeHtml(id.fDate) + "</div>\n";
+    if (!fHighlightsPage.empty()) {
+        std::string count = std::to_string(id.fHighlights);
+        out += "<a class=\"highlights\" href=\"" + EscapeHtml(PageFileName(fHighlightsPage)) + "#" + fHighlightsAnchor +
+               "\" target=\"data_frame\">" + (id.fHighlights > 0 ? count : std::string("No")) + " report highlight" +
+               (id.fHighlights == 1 ? "" : "s") + "</a>\n";
+    }
+    out += "</div>\n";
+    bool listOpen = false;
     for (const TCategory& category : fIndex) {
-        if (category.fName.empty()) {
-            out += "<TR><TD class=\"navgap\"></TD></TR>\n";
-        } else {
-            out += kHtmlIndexCatBeg + EscapeHtml(category.fName) + kHtmlIndexCatEnd;
-        }
+        if (category.fEntries.empty()) continue;
+        if (listOpen) out += "</ul>\n";
+        if (!category.fName.empty()) out += "<h2>" + EscapeHtml(category.fName) + "</h2>\n";
+        out += "<ul>\n";
+        listOpen = true;
         for (const TIndexEntry& entry : category.fEntries) {
-            out += kNavBegin + kNavLinkBegin + "\"" + EscapeHtml(PageFileName(entry.fStem)) + "\"";
+            out += "<li><a href=\"" + EscapeHtml(PageFileName(entry.fStem)) + "\" target=\"data_frame\"";
             if (!entry.fHasData) out += " class=\"nodata\"";
-            out += kNavLinkMid + EscapeHtml(entry.fName);
+            out += ">" + EscapeHtml(entry.fName);
             if (!entry.fHasData) out += " <span class=\"note\">(no data)</span>";
-            out += kNavLinkEnd + kNavEnd + "\n";
+            out += "</a></li>\n";
         }
     }
-    // The script marks the link of the page on show.
-    out += kHtmlIndexLine + kHtmlSortScript + kHtmlIndexFooter;
+    if (listOpen) out += "</ul>\n";
+    out += "</nav>\n</body>\n</html>\n";
     return out;
 }
 
@@ -197,13 +345,19 @@ std::string THtmlWriter::IndexPage() const {
     }
     if (!firstWithData.empty()) first = firstWithData;
     std::string start = first.empty() ? std::string("about:blank") : PageFileName(first);
-    return kHtmlHeaderUTF8 + "<title>Server report</title>\n" +
+    return "<!DOCTYPE html>\n<html lang=\"en\">\n<head>\n<meta charset=\"utf-8\">\n"
+           "<meta name=\"viewport\" content=\"width=device-width, initial-scale=1\">\n<title>" +
+           EscapeHtml(fIdentity.Title()) +
+           "</title>\n<link href=\"global.css\" rel=\"stylesheet\">\n"
+           "<script src=\"tkr_sort.js\" defer></script>\n</head>\n<body class=\"index\">\n"
+           "<button type=\"button\" id=\"navtoggle\" aria-controls=\"nav_frame\" aria-expanded=\"true\">"
+           "Hide navigation</button>\n"
            "<div class=\"frames\">\n"
-           "<iframe class=\"navframe\" name=\"nav_frame\" title=\"Navigation\" src=\"" +
+           "<iframe class=\"navframe\" id=\"nav_frame\" name=\"nav_frame\" title=\"Navigation\" src=\"" +
            kNavBarName +
            "\"></iframe>\n"
            "<iframe class=\"dataframe\" name=\"data_frame\" title=\"Report page\" src=\"" +
-           EscapeHtml(start) + "\"></iframe>\n</div>\n</body>\n" + kHtmlFooter;
+           EscapeHtml(start) + "\"></iframe>\n</div>\n</body>\n</html>\n";
 }
 
 void THtmlWriter::WriteReportFiles() {
