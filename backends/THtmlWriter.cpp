@@ -224,6 +224,9 @@ void THtmlWriter::WriteTableGrid(TTable& table) {
     std::string& out = fPage;
     out += table.fRowHeaders ? kRowTableHeaderBeg : kColTableHeaderBeg;
     if (sortable) out += kTableHeaderSort;
+    // Many rows are laid out by the widths of the header alone, so that a
+    // sort or a filter does not measure every cell again.
+    if (documents && bodyRows > kFixedLayoutRows) out += " bigtable";
     out += kTableHeaderWidth + Percent(table.fTableWidth > 0 ? table.fTableWidth : 100) + kTableHeaderMid + "t" +
            std::to_string(fTableCounter) + kTableHeaderEnd;
 

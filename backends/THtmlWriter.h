@@ -45,6 +45,9 @@ public:
     // data and shows them a page at a time; a smaller one stands whole in
     // the page, where the browser's own find sees every row.
     static const int kWholeTableRows = 10000;
+    // A table of more body rows than this takes its column widths from its
+    // header, not from measuring every cell.
+    static const int kFixedLayoutRows = 1000;
 
 protected:
     explicit THtmlWriter(const std::string& writerType);

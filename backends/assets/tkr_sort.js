@@ -148,13 +148,20 @@
         if (lowered === null) lowered = rows.map(function (row) { return row.textContent.toLowerCase(); });
         return lowered[i].indexOf(needle) >= 0;
       },
-      show: function (order, visible) {
-        var fragment = document.createDocumentFragment();
-        order.forEach(function (i) {
-          rows[i].hidden = !visible[i];
-          fragment.appendChild(rows[i]);
-        });
-        body.appendChild(fragment);
+      // Rows move only when the order changed; a filter only hides and
+      // shows the rows whose state changed.
+      show: function (order, visible, reordered) {
+        if (reordered) {
+          var fragment = document.createDocumentFragment();
+          order.forEach(function (i) { fragment.appendChild(rows[i]); });
+          body.appendChild(fragment);
+        }
+        for (var i = 0; i < rows.length; i++) {
+          if (rows[i].hidden === visible[i]) rows[i].hidden = !visible[i];
+        }
+      },
+      prepare: function () {
+        if (lowered === null) lowered = rows.map(function (row) { return row.textContent.toLowerCase(); });
       }
     };
   }
@@ -215,10 +222,13 @@
       count: data.rows.length,
       cell: function (i, column) { return stripTags(cellHtml(data.rows[i][column])).trim(); },
       matches: function (i, needle) {
+        this.prepare();
+        return plain[i].indexOf(needle) >= 0;
+      },
+      prepare: function () {
         if (plain === null) {
           plain = data.rows.map(function (row) { return stripTags(row.map(cellHtml).join('\u0000')).toLowerCase(); });
         }
-        return plain[i].indexOf(needle) >= 0;
       },
       show: function (order, visible) {
         state.shown = order.filter(function (i) { return visible[i]; });
@@ -236,7 +246,7 @@
     for (var i = 0; i < rows.count; i++) { order.push(i); visible.push(true); }
     var keys = {};  // sort keys by column, made on first use
 
-    function refresh() { rows.show(order, visible); }
+    function refresh(reordered) { rows.show(order, visible, reordered); }
 
     // The filter box, with the count of matching rows.
     var bar = document.createElement('div');
@@ -265,9 +275,9 @@
           if (visible[r]) matched++;
         }
         if (rows.reset) rows.reset();
-        refresh();
+        refresh(false);
         count.textContent = needle === '' ? rows.count + ' rows' : matched + ' of ' + rows.count + ' rows match';
-      }, rows.count > 20000 ? 60 : 0);
+      }, rows.count > 200000 ? 120 : 0);
     });
 
     Array.prototype.forEach.call(table.tHead.rows[0].cells, function (header, column) {
@@ -288,7 +298,7 @@
           return r !== 0 ? (ascending ? r : -r) : position[a] - position[b];
         });
         if (rows.reset) rows.reset();
-        refresh();
+        refresh(true);
         Array.prototype.forEach.call(header.parentNode.cells, function (cell) { cell.removeAttribute('aria-sort'); });
         header.setAttribute('aria-sort', ascending ? 'ascending' : 'descending');
         button.setAttribute('title', 'Sorted ' + (ascending ? 'ascending' : 'descending') + '; press to reverse');
@@ -298,7 +308,11 @@
         if (!button.contains(event.target)) button.click();
       });
     });
-    if (dataElement) refresh();
+    if (dataElement) refresh(true);
+    // The texts the filter searches are made while the reader looks at the
+    // page, so that the first keystroke does not wait for them.
+    var idle = window.requestIdleCallback || function (callback) { return setTimeout(callback, 200); };
+    idle(function () { rows.prepare(); });
   }
 
   function setUpTables() {
