@@ -4,6 +4,7 @@
 
 #include "Assets.h"
 #include "HtmlText.h"
+#include "HumanSize.h"
 #include "braigrion/ReportDefinition.h"
 
 namespace braigrion {
@@ -43,6 +44,17 @@ std::string DocumentHead(const std::string& stem) {
            page +
            ".html\" target=\"_blank\" rel=\"noopener\">Open this page alone</a>"
            "<button type=\"button\" id=\"printpage\">Print</button></nav>\n<main>\n";
+}
+
+// The tooltip of a cell: its second text, and its size as a person reads
+// it when its property declares a byte unit.
+std::string CellTooltip(const TTable& table, int row, int col) {
+    const TTable::TCell& cell = table.Cell(row, col);
+    const size_t property = static_cast<size_t>(table.fRowHeaders ? row : col);
+    const std::string size =
+        property < table.fUnits.size() ? HumanSize(cell.text, table.fUnits[property]) : std::string();
+    if (size.empty()) return cell.rawText;
+    return cell.rawText.empty() ? size : cell.rawText + " (" + size + ")";
 }
 
 // A cell of a big table's data: its mark-up, or [mark-up, tooltip, mono]
@@ -198,8 +210,9 @@ void THtmlWriter::WriteTableData(const TTable& table, int firstBodyRow) {
             const TTable::TCell& cell = table.Cell(r, c);
             std::string html = cell.flags[kFinalText] ? cell.text : SanitizeCellMarkup(cell.text);
             if (c > 0) fPage += ",";
-            if (cell.monospaced || !cell.rawText.empty()) {
-                fPage += "[" + JsonString(html) + "," + JsonString(EscapeHtml(cell.rawText)) + "," +
+            const std::string tooltip = CellTooltip(table, r, c);
+            if (cell.monospaced || !tooltip.empty()) {
+                fPage += "[" + JsonString(html) + "," + JsonString(EscapeHtml(tooltip)) + "," +
                          (cell.monospaced ? "1" : "0") + "]";
             } else {
                 fPage += JsonString(html);
@@ -259,9 +272,10 @@ void THtmlWriter::WriteTableGrid(TTable& table) {
                 headerCell(cell, c, "row", false);
                 continue;
             }
+            const std::string tooltip = CellTooltip(table, r, c);
             out += "<td";
             if (cell.monospaced) out += " class=\"mono\"";
-            if (!cell.rawText.empty()) out += " title=\"" + EscapeHtml(cell.rawText) + "\"";
+            if (!tooltip.empty()) out += " title=\"" + EscapeHtml(tooltip) + "\"";
             out += ">" + cellText(cell) + "</td>";
         }
         out += kTableRowEnd + "\n";
