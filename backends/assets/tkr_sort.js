@@ -47,6 +47,8 @@
   // outside the basic plane moved after all others, so that comparing keys
   // by UTF-16 unit is comparing the text by code point.
   function textKey(text) {
+    // Plain ASCII, the common case, folds in one call.
+    if (!/[^\x00-\x7f]/.test(text)) return text.toLowerCase();
     text = text.replace(/[A-Z]+/g, function (s) { return s.toLowerCase(); });
     if (!/[\uD800-\uFFFF]/.test(text)) return text;
     return text.replace(/[\uD800-\uFFFF]/g, function (c) {
@@ -130,6 +132,7 @@
   }
 
   function stripTags(html) {
+    if (html.indexOf('<') < 0 && html.indexOf('&') < 0) return html;
     return html.replace(/<[^>]*>/g, '').replace(/&lt;/g, '<').replace(/&gt;/g, '>').replace(/&quot;/g, '"')
       .replace(/&#39;/g, '\'').replace(/&amp;/g, '&');
   }
@@ -286,8 +289,15 @@
       button.addEventListener('click', function () {
         var ascending = header.getAttribute('aria-sort') !== 'ascending';
         if (!keys[column]) {
+          // Values repeat down a column (states, sizes): each text's key is made once.
+          var made = new Map();
           keys[column] = [];
-          for (var r = 0; r < rows.count; r++) keys[column].push(sortKey(rows.cell(r, column)));
+          for (var r = 0; r < rows.count; r++) {
+            var value = rows.cell(r, column);
+            var key = made.get(value);
+            if (key === undefined) made.set(value, key = sortKey(value));
+            keys[column].push(key);
+          }
         }
         var k = keys[column];
         // Stable in both directions: equal keys keep the order they had.
