@@ -5,9 +5,10 @@
 // navigation collapsed in a narrow window, and the dark scheme.
 //
 //   node navigation.test.js --report DIR --host NAME --page STEM --other STEM
-//                           [--screenshots DIR]
+//                           --sizes STEM [--screenshots DIR]
 //
-// STEM and the other STEM are two pages with a sortable table. Screenshots
+// STEM and the other STEM are two pages with a sortable table; the page of
+// --sizes has values declared in bytes, shown as sizes in tooltips. Screenshots
 // of the dark scheme go to --screenshots. Exit 0 on success, 1 on a
 // failure, 77 when no Chromium is installed.
 'use strict';
@@ -17,7 +18,7 @@ const path = require('path');
 const { check, parseOptions, run, watchErrors } = require('./support.js');
 const { naturalCompare } = require('../../backends/assets/tkr_sort.js');
 
-const options = parseOptions(process.argv.slice(2), ['report', 'host', 'page', 'other']);
+const options = parseOptions(process.argv.slice(2), ['report', 'host', 'page', 'other', 'sizes']);
 const index = 'file://' + path.resolve(options.report, 'index.html');
 
 function dataFrame(page) {
@@ -191,12 +192,34 @@ async function dark(browser) {
   await page.close();
 }
 
+// Values declared in bytes keep their text and show a size as a tooltip
+// whose figure is the text's count of bytes, or of kilobytes.
+async function sizes(browser) {
+  const page = await browser.newPage();
+  await page.goto('file://' + path.resolve(options.report, options.sizes + '.html'));
+  const cells = await page.$$eval('td[title]', (tds) => tds.map((td) => [td.textContent.trim(), td.title]));
+  const units = { KiB: 2 ** 10, MiB: 2 ** 20, GiB: 2 ** 30, TiB: 2 ** 40, PiB: 2 ** 50 };
+  const sized = cells.filter(([, title]) => / [KMGTP]iB \u00b7 [\d.]+ [KMGTP]B$/.test(title));
+  check(sized.length > 0, `no cell of ${options.sizes} shows a size`);
+  for (const [textShown, title] of sized) {
+    check(/^\d+$/.test(textShown), `the cell "${textShown}" with the size "${title}" is not a count as collected`);
+    const [, figure, unit] = /([\d.]+) (\w+) \u00b7/.exec(title);
+    const bytes = Number(figure) * units[unit];
+    const ratio = [1, 1024].map((per) => bytes / (Number(textShown) * per)).find((r) => Math.abs(r - 1) < 0.01);
+    check(ratio !== undefined, `"${title}" is not the size of ${textShown} bytes or kilobytes`);
+  }
+  await page.close();
+  return sized.length;
+}
+
 run(async (browser) => {
   await identity(browser);
   await links(browser);
   await alone(browser);
   await narrow(browser);
   await dark(browser);
+  const sizedCells = await sizes(browser);
   console.log(`ok: ${options.host} named, highlights linked, #${options.page} and #${options.other} open and survive ` +
-              'a reload, the page alone finds its way back, keyboard sorting, narrow navigation, dark scheme');
+              'a reload, the page alone finds its way back, keyboard sorting, narrow navigation, dark scheme, ' +
+              `${sizedCells} sizes on ${options.sizes}`);
 });
