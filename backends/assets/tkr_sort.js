@@ -155,9 +155,14 @@
       // shows the rows whose state changed.
       show: function (order, visible, reordered) {
         if (reordered) {
+          // Rows move while their body is out of the document: taking each
+          // row out of a live table costs the browser far more.
+          var next = body.nextSibling;
+          table.removeChild(body);
           var fragment = document.createDocumentFragment();
           order.forEach(function (i) { fragment.appendChild(rows[i]); });
           body.appendChild(fragment);
+          table.insertBefore(body, next);
         }
         for (var i = 0; i < rows.length; i++) {
           if (rows[i].hidden === visible[i]) rows[i].hidden = !visible[i];
