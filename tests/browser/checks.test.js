@@ -1,7 +1,8 @@
 // Every page of a report passes the checkers: axe-core (the WCAG 2 A and AA
 // rules) finds no violation in the light or the dark scheme, and tidy finds
 // no error in its mark-up (that part is skipped, saying so, where tidy is
-// not installed).
+// not installed). Every page but the index and the navigation has its way
+// back to the index, opening that page.
 //
 //   node checks.test.js --report DIR
 //
@@ -58,9 +59,15 @@ run(async (browser) => {
         return result.violations.map((v) => ({ id: v.id, nodes: v.nodes.map((n) => ({ target: n.target })) }));
       }, AXE_TAGS);
       if (violations.length) problems.push(`axe, ${name} (${scheme}): ${describe(violations)}`);
+      if (scheme === 'light' && name !== 'index.html' && name !== 'navbar.html') {
+        const back = await page.$$eval('a.backtoindex', (links) => links.map((a) => a.getAttribute('href')));
+        const wanted = 'index.html#' + name.replace(/\.html$/, '');
+        if (back.length !== 1 || back[0] !== wanted) problems.push(`${name}: its way back is ${JSON.stringify(back)}, not ${wanted}`);
+      }
     }
     await context.close();
   }
   check(problems.length === 0, `${problems.length} pages with problems:\n  ${problems.join('\n  ')}`);
-  console.log(`ok: ${files.length} pages, no axe violation in either scheme${hasTidy() ? ', no tidy error' : ''}`);
+  console.log(`ok: ${files.length} pages, no axe violation in either scheme${hasTidy() ? ', no tidy error' : ''}, ` +
+              'each page with its way back to the index');
 });
