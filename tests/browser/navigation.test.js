@@ -104,6 +104,12 @@ async function links(browser) {
   const data = dataFrame(page);
   check(await data.isVisible('.pagetools a.openalone'), 'a framed page does not offer to open alone');
   check(!(await data.isVisible('.pagetools a.backtoindex')), 'a framed page offers a way back to the index');
+  // Print prints the page's own document, not the index around it.
+  await data.evaluate(() => { window.printed = 0; window.print = () => { window.printed++; }; });
+  await page.evaluate(() => { window.printed = 0; window.print = () => { window.printed++; }; });
+  await data.click('#printpage');
+  check(await data.evaluate(() => window.printed) === 1 && await page.evaluate(() => window.printed) === 0,
+    'Print in the frame does not print the page itself');
   errors();
   await page.close();
 }
