@@ -21,6 +21,7 @@ public:
 
 protected:
     std::string PageHeader(bool sortHeader) const override;
+    bool WritesDocuments() const override { return false; }
     void SavePage(const std::string& stem, const std::string& text) override;
     void WriteReportFiles() override;
     bool WritesListedPages() const override { return false; }

@@ -10,14 +10,19 @@
 #include "ValueRendering.h"
 #include "tkrcore/Callbacks.h"
 #include "tkrcore/TRootObject.h"
+#include "tkrcore/TTKRException.h"
 
 namespace braigrion {
 
 using NORVTKR20::ICIMClass;
 using NORVTKR20::ICIMInstance;
+using NORVTKR20::ICIMNamespace;
+using NORVTKR20::ICIMQualifier;
+using NORVTKR20::TCIMValue;
 using NORVTKR20::TAddToVectorCallback;
 using NORVTKR20::TCIMContext;
 using NORVTKR20::TRootObject;
+using NORVTKR20::TTKRException;
 
 namespace {
 
@@ -199,6 +204,25 @@ TTable::TCell& CellOf(TTable& table, bool rowReport, int index, int column) {
     return rowReport ? table.Cell(column, index + 1) : table.Cell(index + 1, column);
 }
 
+// The "Units" qualifier of a column's property, so that a back-end may show
+// a size in bytes as a person reads it; "" when the property declares none.
+std::string DeclaredUnit(ICIMNamespace& ns, ICIMClass& cls, const TReportProperty& column) {
+    TCIMContext empty;
+    try {
+        TWriterUtil::TPropertyDeclPtr declaration =
+            column.HasAssociationTarget()
+                ? ns.GetClass(column.GetAssociationTarget(), empty)->GetPropertyDecl(column.GetProperty(), empty)
+                : cls.GetPropertyDecl(column.GetProperty(), empty);
+        bool propagated = false;
+        boost::shared_ptr<const ICIMQualifier> units = declaration->GetQualifier("Units", propagated, empty);
+        const TCIMValue& value = units->GetValue(empty);
+        return value.IsNull() ? std::string() : static_cast<std::string>(value);
+    } catch (const TTKRException& ex) {
+        if (!IsNotFound(ex)) throw;
+    }
+    return std::string();
+}
+
 }  // namespace
 
 void TWriter::WriteTable(TReportClass reportClass, std::vector<TInstancePtr> instances, bool isTopLevel,
@@ -241,6 +265,7 @@ void TWriter::WriteTable(TReportClass reportClass, std::vector<TInstancePtr> ins
         boost::shared_ptr<ICIMClass> cls = rows.instances[start]->GetClass(empty);
         for (size_t j = 0; j < columns.size(); ++j) {
             CellOf(table, rowReport, -1, static_cast<int>(j)).text = GetTableHeaderLabel(*cls, columns[j], context);
+            table.fUnits.push_back(fNamespace ? DeclaredUnit(*fNamespace, *cls, columns[j]) : std::string());
         }
         for (size_t i = 0; i < count; ++i) {
             const size_t row = start + i;

@@ -3,7 +3,8 @@
 # Safe to run again: apt-get only installs what is missing.
 #   scripts/setup.sh           what building needs
 #   scripts/setup.sh --tests   also what the browser tests need: Chromium,
-#                              Node.js and the npm packages of tests/browser
+#                              Node.js, tidy and the npm packages of
+#                              tests/browser
 set -euo pipefail
 here="$(cd "$(dirname "$0")/.." && pwd)"
 tests=0
@@ -37,10 +38,22 @@ if [ "$tests" -eq 1 ]; then
       echo "setup: warning: chromium could not be installed; the browser tests will be skipped" >&2
     fi
   fi
-  if ! command -v node >/dev/null 2>&1 || ! command -v npm >/dev/null 2>&1; then
-    $SUDO apt-get install -y -qq --no-install-recommends nodejs npm >/dev/null
+  # Node.js runs the browser tests; tidy checks the mark-up of every page.
+  test_packages=()
+  command -v node >/dev/null 2>&1 || test_packages+=(nodejs)
+  command -v npm >/dev/null 2>&1 || test_packages+=(npm)
+  command -v tidy >/dev/null 2>&1 || test_packages+=(tidy)
+  if [ "${#test_packages[@]}" -gt 0 ]; then
+    $SUDO apt-get install -y -qq --no-install-recommends "${test_packages[@]}" >/dev/null
   fi
-  if [ ! -f "$here/tests/browser/node_modules/playwright-core/package.json" ]; then
+  # The npm packages of the browser tests, installed again when any of the
+  # dependencies of package.json is missing from node_modules.
+  missing=$(cd "$here/tests/browser" && node -e '
+    const fs = require("fs");
+    const deps = Object.keys(require("./package.json").dependencies || {});
+    console.log(deps.filter((d) => !fs.existsSync("node_modules/" + d + "/package.json")).join(" "));')
+  if [ -n "$missing" ]; then
+    echo "setup: installing the npm packages of the browser tests (missing: $missing)"
     (cd "$here/tests/browser" && npm ci --no-audit --no-fund --loglevel=error)
   fi
   echo "setup: test dependencies are installed"

@@ -23,6 +23,10 @@ public:
     const TCell& Cell(int row, int col) const { return fCells[static_cast<size_t>(row * fCols + col)]; }
 
     std::vector<int> fColumnWidths;  // percent of the table width per column; 0 at first
+    // The unit declared for each property shown ("Bytes", "KiloBytes"): by
+    // column, or by row when the first column holds the labels; "" where
+    // none is declared, and empty when the table's filler does not say.
+    std::vector<std::string> fUnits;
     int fTableWidth;                 // percent; 100 at first
     bool fSortable;                  // the reader may sort the table by its header
     bool fFlagB;

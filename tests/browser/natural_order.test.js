@@ -30,3 +30,23 @@ test('equal numbers with leading zeros tie, and the empty text comes first', () 
   assert.strictEqual(naturalCompare('Slot 01', 'slot 1'), 0);
   assert.ok(naturalCompare('', '0') < 0);
 });
+
+// Beyond the report's own order, the script reads whole values as a person
+// does: decimals, signs, sizes with units and hexadecimal as numbers.
+test('whole values read as numbers sort as numbers', () => {
+  const lists = [
+    ['1.125', '1.25', '1.5', '2', '10.75'],
+    ['-10', '-2.5', '-2', '-0.5', '0', '0.25', '3'],
+    ['512 B', '900 KB', '10 MB', '1.5 GB', '2 TB'],
+    ['0x9', '0xa', '0x1f', '0x100'],
+    ['800 MHz', '1.2 GHz', '3 GHz'],
+    ['5%', '12.5%', '100%'],
+  ];
+  for (const list of lists) {
+    const reversed = [...list].reverse();
+    assert.deepStrictEqual(reversed.sort(naturalCompare), list);
+  }
+  // A value that only starts with a number keeps the token order.
+  assert.ok(naturalCompare('Slot 9', 'Slot 10') < 0);
+  assert.ok(naturalCompare('1.9.2', '1.10.0') < 0);
+});

@@ -96,7 +96,7 @@ async function main() {
         const nav = page.frame({ name: 'nav_frame' });
         const data = page.frame({ name: 'data_frame' });
         if (!nav || !data) throw new Error(`${index}: no navigation or page frame`);
-        await nav.waitForSelector('#navbar a', { timeout: 10000 });
+        await nav.waitForSelector('#navbar a', { state: 'attached', timeout: 10000 });
         const links = await nav.$$eval('#navbar a', (anchors) => anchors.map((a) => a.getAttribute('href')));
         for (const link of links) {
           await data.goto('file://' + path.resolve(report, link));

@@ -272,3 +272,44 @@ TEST(TableFilter, ClassesWithoutPassingInstancesAreRemoved) {
 
 }  // namespace
 }  // namespace braigrion
+
+namespace braigrion {
+namespace {
+
+// Keeps the declared units of every grid the engine writes.
+class TUnitsWriter : public testing::TRecordingWriter {
+public:
+    using TRecordingWriter::TRecordingWriter;
+    void WriteTableGrid(TTable& table) override {
+        units.push_back(table.fUnits);
+        TRecordingWriter::WriteTableGrid(table);
+    }
+    std::vector<std::vector<std::string>> units;
+};
+
+// Each grid carries the "Units" of its properties, one per column (per row
+// in a row report), inherited declarations and association targets
+// included; a property without the qualifier, or not declared, has "".
+TEST(TableEngine, GridsCarryTheDeclaredUnits) {
+    TRepoBuilder repo;
+    auto ns = repo.Namespace();
+    ns->DeclareClass(C("CIM_Extent", "", {P("Capacity", T::eUint64, {Q("Units", TCIMValue("KiloBytes"))})}));
+    ns->DeclareClass(C("ORVSG_Disk", "CIM_Extent",
+                       {P("Name", T::eString), P("Size", T::eUint64, {Q("Units", TCIMValue("Bytes"))})}));
+    repo.Add("ORVSG_Disk", {testing::Str("Name", "sda"), testrepo::V("Size", TCIMValue::Unsigned(T::eUint64, 4096)),
+                            testrepo::V("Capacity", TCIMValue::Unsigned(T::eUint64, 4))});
+    repo.Add("ORVSG_Disk", {testing::Str("Name", "sdb")});
+    TReportClass columns =
+        Table("ORVSG_Disk", {Column("Name", "25%"), Column("Size", "25%"), Column("Capacity", "25%"), Column("Nothing", "25%")});
+    const std::vector<std::string> expected = {"", "Bytes", "KiloBytes", ""};
+    for (auto style : {TReportClass::COLUMN_REPORT, TReportClass::ROW_REPORT}) {
+        columns.SetReportStyle(style);
+        TEngineRun<TUnitsWriter> run(ns);
+        run.writer.WriteTable(columns, testrepo::All(*ns, "ORVSG_Disk"), true, false, {});
+        ASSERT_EQ(1u, run.writer.units.size());
+        EXPECT_EQ(expected, run.writer.units[0]);
+    }
+}
+
+}  // namespace
+}  // namespace braigrion
