@@ -1,9 +1,5 @@
 // Generators of the hardware pages: inventory, PCI, firmware, service
 // processor, sensors, storage controllers and adapters.
-//
-// A call of NotYetGenerated stands for one page whose section writer or
-// delta comparison is not part of the library yet; the comment beside it
-// names the call that replaces it.
 #include <cctype>
 #include <cstdlib>
 

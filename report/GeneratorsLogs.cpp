@@ -1,10 +1,6 @@
 // Generators of the log and analysis pages: operating system and service
 // processor logs, the pages of the tool's own service mode, merged logs and
 // devices, patches, file loads, diagnostics and the tool's error log.
-//
-// A call of NotYetGenerated stands for one page whose definition or section
-// writer is not part of the library yet; the comment beside it names the
-// call that replaces it.
 #include "braigrion/ReportDefinition.h"
 #include "braigrion/TWriter.h"
 #include "GeneratorSupport.h"
