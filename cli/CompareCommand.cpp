@@ -81,7 +81,7 @@ CLI::App* AddCompareCommand(CLI::App& app, TCompareOptions& options) {
         ->type_name("FILE");
     command->add_option("--save-records", options.fSaveRecords, "Also save the computed delta records as CIM-XML")
         ->type_name("FILE");
-    command->add_flag("--force", options.fForce, "Replace DIR even when it is not an earlier report");
+    command->add_flag("--force", options.fForce, "Write into DIR even when it is not an earlier report, among its files; nothing the report did not write is replaced");
     command->add_flag("-q,--quiet", options.fQuiet, "No progress on standard error");
     AddRunOptions(*command, options.fRun);
     command->footer(

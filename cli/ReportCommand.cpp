@@ -57,7 +57,7 @@ CLI::App* AddReportCommand(CLI::App& app, TReportOptions& options) {
                         "Report for a base collection or an ESXi host; auto tells them apart by their classes")
         ->check(CLI::IsMember({"auto", "base", "esxi"}))
         ->capture_default_str();
-    command->add_flag("--force", options.fForce, "Replace DIR even when it is not an earlier report");
+    command->add_flag("--force", options.fForce, "Write into DIR even when it is not an earlier report, among its files; nothing the report did not write is replaced");
     command->add_flag("-q,--quiet", options.fQuiet, "No progress on standard error");
     AddRunOptions(*command, options.fRun);
     command->footer(
