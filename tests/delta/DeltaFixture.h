@@ -70,20 +70,16 @@ private:
 
 // A recording writer whose grids show one row per line; a cell flagged as
 // agreeing with the baseline is marked with "=".
-class TGridRecorder : public TRecordingWriter {
+class TGridRecorder : public TGridLinesRecorder {
 public:
-    using TRecordingWriter::TRecordingWriter;
-    void WriteTableGrid(TTable& table) override {
-        const std::string described = Describe(table);
-        Note("WriteTableGrid(" + described.substr(0, described.find(" |")) + ")");
-        for (int row = 0; row < table.fRows; ++row) {
-            std::string line = "  |";
-            for (int col = 0; col < table.fCols; ++col) {
-                const TTable::TCell& cell = table.Cell(row, col);
-                line += std::string(" ") + (cell.monospaced ? "#" : "") + (cell.flags[0] ? "=" : "") + Quote(cell.text);
-            }
-            Note(line);
-        }
+    explicit TGridRecorder(const std::string& writerType = "html") : TGridLinesRecorder(writerType, Marks()) {}
+
+private:
+    static TMarks Marks() {
+        TMarks marks;
+        marks.monospaced = true;
+        marks.agreement = true;
+        return marks;
     }
 };
 

@@ -20,27 +20,15 @@ namespace braigrion {
 namespace {
 
 namespace fs = std::filesystem;
-using testing::TRecordingWriter;
+using testing::TGridLinesRecorder;
 
-// A recording writer whose grids show one row per line, so that an expected
-// page reads as a table.
-class TPageRecorder : public TRecordingWriter {
-public:
-    using TRecordingWriter::TRecordingWriter;
-    void WriteTableGrid(TTable& table) override {
-        const std::string described = Describe(table);
-        Note("WriteTableGrid(" + described.substr(0, described.find(" |")) + ")");
-        for (int row = 0; row < table.fRows; ++row) {
-            std::string line = "  |";
-            for (int col = 0; col < table.fCols; ++col) {
-                const TTable::TCell& cell = table.Cell(row, col);
-                line += std::string(" ") + (cell.monospaced ? "#" : "") + Quote(cell.text);
-                if (!cell.rawText.empty()) line += "~" + Quote(cell.rawText);
-            }
-            Note(line);
-        }
-    }
-};
+// Grids one row per line, monospaced cells and second texts marked.
+TGridLinesRecorder::TMarks PageMarks() {
+    TGridLinesRecorder::TMarks marks;
+    marks.monospaced = true;
+    marks.rawText = true;
+    return marks;
+}
 
 bool StartsWith(const std::string& text, const std::string& prefix) {
     return text.compare(0, prefix.size(), prefix) == 0;
@@ -54,7 +42,7 @@ std::map<std::string, std::string> WritePages(const std::string& sample) {
         if (entry.path().extension() == ".xml") files.push_back(entry.path().string());
     }
     std::sort(files.begin(), files.end());
-    TPageRecorder writer("html");
+    TGridLinesRecorder writer("html", PageMarks());
     // The example lookup files, so that documentation links show.
     TWriter::TLogLinkSettings links;
     links.fDataFolder = std::string(BRAIGRION_SOURCE_DIR) + "/data";

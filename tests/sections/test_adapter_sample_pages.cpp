@@ -23,25 +23,13 @@ namespace braigrion {
 namespace {
 
 namespace fs = std::filesystem;
-using testing::TRecordingWriter;
 
-// Grids one row per line, so that an expected page reads as a table.
-class TPageRecorder : public TRecordingWriter {
-public:
-    using TRecordingWriter::TRecordingWriter;
-    void WriteTableGrid(TTable& table) override {
-        const std::string described = Describe(table);
-        Note("WriteTableGrid(" + described.substr(0, described.find(" |")) + ")");
-        for (int row = 0; row < table.fRows; ++row) {
-            std::string line = "  |";
-            for (int col = 0; col < table.fCols; ++col) {
-                const TTable::TCell& cell = table.Cell(row, col);
-                line += std::string(" ") + (cell.monospaced ? "#" : "") + Quote(cell.text);
-            }
-            Note(line);
-        }
-    }
-};
+// Grids one row per line, monospaced cells marked.
+testing::TGridLinesRecorder::TMarks PageMarks() {
+    testing::TGridLinesRecorder::TMarks marks;
+    marks.monospaced = true;
+    return marks;
+}
 
 bool StartsWith(const std::string& text, const std::string& prefix) {
     return text.compare(0, prefix.size(), prefix) == 0;
@@ -60,7 +48,7 @@ TEST(AdapterSamplePages, LuzReportOfTheSampleServer) {
         if (entry.path().extension() == ".xml") files.push_back(entry.path().string());
     }
     std::sort(files.begin(), files.end());
-    TPageRecorder writer("html");
+    testing::TGridLinesRecorder writer("html", PageMarks());
     std::map<std::string, NORVTKR20::TCIMValue> context;
     context["mode"] = NORVTKR20::TCIMValue(std::string("luz"));
     TReport report(repository::LoadCollection(files).fNamespace, context, out.string());

@@ -22,19 +22,7 @@ namespace {
 namespace fs = std::filesystem;
 
 // Grids one row a line, as in the other page transcripts.
-class TGridRecorder : public testing::TRecordingWriter {
-public:
-    using TRecordingWriter::TRecordingWriter;
-    void WriteTableGrid(TTable& table) override {
-        const std::string described = Describe(table);
-        Note("WriteTableGrid(" + described.substr(0, described.find(" |")) + ")");
-        for (int row = 0; row < table.fRows; ++row) {
-            std::string line = "  |";
-            for (int col = 0; col < table.fCols; ++col) line += " " + Quote(table.Cell(row, col).text);
-            Note(line);
-        }
-    }
-};
+using TGridRecorder = testing::TGridLinesRecorder;
 
 std::vector<std::string> SampleFiles(const std::string& sample) {
     std::vector<std::string> files;

@@ -157,5 +157,27 @@ void TRecordingWriter::WriteHalcyonEventLog(const std::vector<TInstancePtr>& rec
     Record("WriteHalcyonEventLog", {list + "]", Quote(fileStem), Quote(title)});
 }
 
+TGridLinesRecorder::TGridLinesRecorder(const std::string& writerType) : TRecordingWriter(writerType), fMarks() {}
+
+TGridLinesRecorder::TGridLinesRecorder(const std::string& writerType, TMarks marks)
+    : TRecordingWriter(writerType), fMarks(marks) {}
+
+void TGridLinesRecorder::WriteTableGrid(TTable& table) {
+    const std::string described = Describe(table);
+    Note("WriteTableGrid(" + described.substr(0, described.find(" |")) + ")");
+    for (int row = 0; row < table.fRows; ++row) {
+        std::string line = "  |";
+        for (int col = 0; col < table.fCols; ++col) {
+            const TTable::TCell& cell = table.Cell(row, col);
+            line += " ";
+            if (fMarks.monospaced && cell.monospaced) line += "#";
+            if (fMarks.agreement && cell.flags[0]) line += "=";
+            line += Quote(cell.text);
+            if (fMarks.rawText && !cell.rawText.empty()) line += "~" + Quote(cell.rawText);
+        }
+        Note(line);
+    }
+}
+
 }  // namespace testing
 }  // namespace braigrion

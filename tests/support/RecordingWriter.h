@@ -174,5 +174,25 @@ private:
     std::map<int, std::string> fSeparators;
 };
 
+// A recording writer whose grids show one row per line, so that an expected
+// page reads as a table. Each cell is quoted; the marks chosen put "#"
+// before a monospaced cell, "=" before a cell flagged as agreeing with a
+// baseline (its first back-end flag), and "~" and the second text after a
+// cell that has one.
+class TGridLinesRecorder : public TRecordingWriter {
+public:
+    struct TMarks {
+        bool monospaced = false;
+        bool agreement = false;
+        bool rawText = false;
+    };
+    explicit TGridLinesRecorder(const std::string& writerType = "html");
+    TGridLinesRecorder(const std::string& writerType, TMarks marks);
+    void WriteTableGrid(TTable& table) override;
+
+private:
+    TMarks fMarks;
+};
+
 }  // namespace testing
 }  // namespace braigrion
