@@ -93,6 +93,12 @@ struct TEntry {
     std::vector<TMemoryInstance*> fSlots;
 };
 
+// How the instances of a class are named for matching.
+enum class TNaming {
+    eKeys,           // the key bindings of their paths, less the keys left out
+    eAllProperties,  // every present scalar property, less the names left out
+};
+
 class TClassComparison {
 public:
     TClassComparison(const std::string& name, const std::vector<TMemoryClass*>& classes,
@@ -100,33 +106,49 @@ public:
         : fName(name), fClasses(classes), fHosts(hosts) {}
 
     // Matches the instances of every collection; false when some collection
-    // holds two instances that the matching keys do not tell apart.
-    bool Match(const std::set<std::string>& leftOut) {
+    // holds two instances of one name. With `pairDuplicates` it always
+    // succeeds: the k-th instance of a name in one collection matches the
+    // k-th of that name in each other collection.
+    bool Match(const std::set<std::string>& leftOut, TNaming naming, bool pairDuplicates) {
         fEntries.clear();
         fIndex.clear();
+        fDuplicates.clear();
+        fHostValues = naming == TNaming::eAllProperties ? leftOut : std::set<std::string>();
         for (size_t c = 0; c < fClasses.size(); ++c) {
             if (!fClasses[c]) continue;
             for (const auto& instance : fClasses[c]->GetInstances()) {
-                std::string name = ReducedPath(*instance, leftOut);
+                std::string name = naming == TNaming::eKeys ? ReducedPath(*instance, leftOut)
+                                                            : PropertyPath(*instance, leftOut);
                 auto found = fIndex.emplace(name, fEntries.size());
                 if (found.second) {
                     fEntries.push_back(TEntry{std::move(name), std::vector<TMemoryInstance*>(fClasses.size())});
                 }
-                TEntry& entry = fEntries[found.first->second];
-                if (entry.fSlots[c]) return false;
-                entry.fSlots[c] = instance.get();
+                size_t at = found.first->second;
+                if (fEntries[at].fSlots[c] || fDuplicates.count(at)) {
+                    if (!pairDuplicates) return false;
+                    at = NextDuplicate(at, c);
+                }
+                fEntries[at].fSlots[c] = instance.get();
             }
         }
         return true;
     }
 
-    // Key names that name the host, by name or by value.
-    std::set<std::string> HostKeys() const {
+    // Names that name the host, by name or by value: of the keys, or with
+    // `everyProperty` of every property, as instances named by all their
+    // values need.
+    std::set<std::string> HostKeys(bool everyProperty) const {
         std::set<std::string> keys;
         for (size_t c = 0; c < fClasses.size(); ++c) {
             if (!fClasses[c]) continue;
+            const auto& decls = fClasses[c]->GetProperties();
             for (const std::string& key : fClasses[c]->GetKeyNames()) {
                 if (IsHostKeyName(key)) keys.insert(Lower(key));
+            }
+            if (everyProperty) {
+                for (const auto& decl : decls) {
+                    if (IsHostKeyName(decl->GetName())) keys.insert(Lower(decl->GetName()));
+                }
             }
             if (fHosts[c].empty()) continue;
             for (const auto& instance : fClasses[c]->GetInstances()) {
@@ -135,8 +157,14 @@ public:
                         keys.insert(Lower(key));
                     }
                 };
-                for (const std::string& key : fClasses[c]->GetKeyNames()) {
-                    if (const TMemoryInstance::TSlot* slot = instance->FindSlot(key)) check(key, slot->fValue);
+                if (everyProperty) {
+                    for (const TMemoryInstance::TSlot& slot : instance->GetSlots()) {
+                        check(decls[slot.fDecl]->GetName(), slot.fValue);
+                    }
+                } else {
+                    for (const std::string& key : fClasses[c]->GetKeyNames()) {
+                        if (const TMemoryInstance::TSlot* slot = instance->FindSlot(key)) check(key, slot->fValue);
+                    }
                 }
                 for (const auto& extra : instance->GetExtraKeys()) check(extra.first, extra.second);
             }
@@ -165,13 +193,62 @@ public:
         for (TMemoryClass* cls : fClasses) {
             if (cls) for (const std::string& key : cls->GetKeyNames()) allKeys.insert(Lower(key));
         }
+        // Nor are values that name the host, where they name the instances.
         names.erase(std::remove_if(names.begin(), names.end(),
-                                   [&allKeys](const std::string& n) { return allKeys.count(Lower(n)) > 0; }),
+                                   [&](const std::string& n) {
+                                       return allKeys.count(Lower(n)) > 0 || fHostValues.count(Lower(n)) > 0;
+                                   }),
                     names.end());
         return names;
     }
 
 private:
+    // Instances that share the name of entry `head`: the entries, in the
+    // order made, and how many of them each collection has taken.
+    struct TDuplicates {
+        std::vector<size_t> fEntries;
+        std::vector<size_t> fTaken;
+    };
+
+    // The entry for collection `c`'s next instance named as entry `head`,
+    // made when every earlier one is taken. Constant time per instance, so
+    // that a class of many identical instances stays linear.
+    size_t NextDuplicate(size_t head, size_t c) {
+        TDuplicates& dups = fDuplicates[head];
+        if (dups.fEntries.empty()) {
+            dups.fEntries.push_back(head);
+            dups.fTaken.assign(fClasses.size(), 1);
+            // Collections met before the first clash each took the head.
+            for (size_t other = 0; other < fClasses.size(); ++other) {
+                if (!fEntries[head].fSlots[other]) dups.fTaken[other] = 0;
+            }
+        }
+        // Each collection takes the entries of a name in order.
+        const size_t k = dups.fTaken[c]++;
+        if (k < dups.fEntries.size()) return dups.fEntries[k];
+        fEntries.push_back(TEntry{fEntries[head].fName, std::vector<TMemoryInstance*>(fClasses.size())});
+        dups.fEntries.push_back(fEntries.size() - 1);
+        return fEntries.size() - 1;
+    }
+
+    // The path that names an instance by every present scalar property
+    // that is not a reference, as a class without keys names its
+    // instances; the repository resolves such a path by those values.
+    std::string PropertyPath(TMemoryInstance& instance, const std::set<std::string>& leftOut) const {
+        TCIMReference path;
+        path.SetClassName(instance.GetMemoryClass().GetName());
+        const auto& decls = instance.GetMemoryClass().GetProperties();
+        for (const TMemoryInstance::TSlot& slot : instance.GetSlots()) {
+            const auto& decl = decls[slot.fDecl];
+            if (slot.fValue.IsNull() || slot.fValue.IsArray() || decl->GetType() == TType::eReference) continue;
+            if (!leftOut.count(Lower(decl->GetName()))) path.AddKeyValue(decl->GetName(), slot.fValue);
+        }
+        for (const auto& extra : instance.GetExtraKeys()) {
+            if (!leftOut.count(Lower(extra.first))) path.AddKeyValue(extra.first, extra.second);
+        }
+        return path.GetPath();
+    }
+
     // The instance's object path with only the matching keys, as the
     // report's paths print it.
     std::string ReducedPath(TMemoryInstance& instance, const std::set<std::string>& leftOut) const {
@@ -189,6 +266,8 @@ private:
     const std::vector<std::unordered_set<std::string>>& fHosts;
     std::vector<TEntry> fEntries;
     std::unordered_map<std::string, size_t> fIndex;
+    std::unordered_map<size_t, TDuplicates> fDuplicates;
+    std::set<std::string> fHostValues;  // names left out of instances named by their values
 };
 
 TPropertyValue Value(const std::string& name, const TCIMValue& value) {
@@ -292,7 +371,14 @@ boost::shared_ptr<TMemoryNamespace> ComputeDeltaRecords(
         std::vector<TMemoryClass*> classes;
         for (const auto& ns : collections) classes.push_back(ns->FindClass(className));
         TClassComparison comparison(className, classes, hosts);
-        if (!comparison.Match(comparison.HostKeys())) comparison.Match(std::set<std::string>());
+        // The keys less the host's; else all keys; else, for instances the
+        // keys cannot tell apart (a collector that left its key out), every
+        // value but the host's, identical instances paired in order.
+        if (!comparison.Match(comparison.HostKeys(false), TNaming::eKeys, false) &&
+            !comparison.Match(std::set<std::string>(), TNaming::eKeys, false)) {
+            comparison.Match(comparison.HostKeys(true), TNaming::eAllProperties, true);
+            counts.fNamedByValues.push_back(className);
+        }
         ++counts.fClasses;
         const std::vector<std::string> properties = comparison.ComparedProperties();
         for (const TEntry& entry : comparison.Entries()) {

@@ -35,6 +35,9 @@ struct TDeltaSummary {
     size_t fMissing = 0;         // type 1 records
     size_t fUnique = 0;          // type 2 records
     size_t fPropertyDeltas = 0;  // type 4 records
+    // Classes whose keys could not tell instances apart, so that their
+    // instances were matched by their values.
+    std::vector<std::string> fNamedByValues;
 };
 
 // Key names that name the host rather than the instance: "SystemName",
@@ -72,7 +75,10 @@ private:
 // ORVSG_ComputerSystem, the "HostName" of ORVSG_IPService and of
 // ORVSG_CollectionInfo, each also without its domain). Should the keys left
 // fail to tell the instances of one collection apart, the class is matched
-// by all its keys.
+// by all its keys; should those fail too (a collector that left a key
+// property out), its instances are named by every scalar value that does
+// not name the host, and identical instances of one collection are paired
+// in order with those of the others.
 boost::shared_ptr<TMemoryNamespace> ComputeDeltaRecords(
     const std::vector<boost::shared_ptr<TMemoryNamespace>>& collections, TDeltaSummary* summary = nullptr);
 

@@ -49,6 +49,33 @@ public:
         return *this;
     }
 
+    // Declares a class keyed on `key`, its other properties strings.
+    TCollection& Declare(const std::string& className, const std::string& key, const std::vector<std::string>& others) {
+        repository::TClassData data;
+        data.fName = className;
+        repository::TPropertyDeclData keyDecl;
+        keyDecl.fName = key;
+        repository::TQualifierData qualifier;
+        qualifier.fName = "Key";
+        qualifier.fValue = NORVTKR20::TCIMValue::Boolean(true);
+        keyDecl.fQualifiers.push_back(qualifier);
+        data.fProperties.push_back(keyDecl);
+        for (const std::string& name : others) {
+            repository::TPropertyDeclData decl;
+            decl.fName = name;
+            data.fProperties.push_back(decl);
+        }
+        fNamespace->DeclareClass(data);
+        return *this;
+    }
+
+    // An instance without a path of its own, as a collector that names none
+    // leaves it.
+    TCollection& AddUnnamed(const std::string& className, std::vector<TValue> values) {
+        fNamespace->AddInstance(className, std::move(values));
+        return *this;
+    }
+
     // An association instance of `assocClass` from one path to another.
     TCollection& Link(const std::string& assocClass, const std::string& from, const std::string& to) {
         NORVTKR20::TCIMReference a, b;

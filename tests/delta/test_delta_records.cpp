@@ -134,6 +134,65 @@ TEST(DeltaRecords, KeysThatCannotTellInstancesApartAreKept) {
               Records(repository::ComputeDeltaRecords({a.Namespace(), b.Namespace()})));
 }
 
+TEST(DeltaRecords, InstancesWithoutTheirKeyMatchByTheirValues) {
+    // A collector that leaves the key property out: the class keys on
+    // InstanceID, its instances carry only a name, a version and, for some,
+    // the host by name ("SystemName") or by value ("Node").
+    struct TFirmware {
+        const char* name;
+        const char* version;
+    };
+    auto collection = [](const std::string& serial, const std::string& host, std::vector<TFirmware> firmware) {
+        TCollection c(serial, host, "20240311141531.000000-300");
+        c.Declare("ORVSG_AdapterFirmware", "InstanceID", {"Name", "Version", "SystemName", "Node"});
+        for (const TFirmware& f : firmware) {
+            c.AddUnnamed("ORVSG_AdapterFirmware", {Val("Name", TCIMValue(f.name)), Val("Version", TCIMValue(f.version)),
+                                                   Val("SystemName", TCIMValue(host)), Val("Node", TCIMValue(host))});
+        }
+        return c.Namespace();
+    };
+    const std::string port0 = "ORVSG_AdapterFirmware.Name=\"port 0\",Version=";
+    const struct {
+        const char* what;
+        TNs baseline, other;
+        std::vector<std::string> records;
+    } cases[] = {
+        {"identical collections, a duplicate in each",
+         collection("SN1", "alpha", {{"port 0", "11.4"}, {"port 1", "11.4"}, {"port 1", "11.4"}}),
+         collection("SN1", "alpha", {{"port 1", "11.4"}, {"port 0", "11.4"}, {"port 1", "11.4"}}),
+         {}},
+        {"an updated version reads as the old missing and the new unique",
+         collection("SN1", "alpha", {{"port 0", "11.4"}, {"port 1", "11.4"}}),
+         collection("SN1", "alpha", {{"port 0", "11.5"}, {"port 1", "11.4"}}),
+         {"ORVSG_AdapterFirmware 1 " + port0 + "\"11.4\" [1]", "ORVSG_AdapterFirmware 2 " + port0 + "\"11.5\" [1]"}},
+        {"one of two identical instances gone",
+         collection("SN1", "alpha", {{"port 0", "11.4"}, {"port 0", "11.4"}}),
+         collection("SN1", "alpha", {{"port 0", "11.4"}}),
+         {"ORVSG_AdapterFirmware 1 " + port0 + "\"11.4\" [1]"}},
+        {"two machines: the values that name the host are left out",
+         collection("SN1", "alpha", {{"port 0", "11.4"}, {"port 0", "11.4"}}),
+         collection("SN2", "beta", {{"port 0", "11.4"}, {"port 0", "11.4"}}),
+         {}},
+    };
+    for (const auto& c : cases) {
+        repository::TDeltaSummary summary;
+        std::vector<std::string> records;
+        for (const std::string& line : Records(repository::ComputeDeltaRecords({c.baseline, c.other}, &summary))) {
+            if (line.rfind("ORVSG_AdapterFirmware ", 0) == 0) records.push_back(line);
+        }
+        EXPECT_EQ(c.records, records) << c.what;
+        EXPECT_EQ(std::vector<std::string>{"ORVSG_AdapterFirmware"}, summary.fNamedByValues) << c.what;
+        // The report finds each record's instance by the values it names.
+        for (const std::string& line : records) {
+            const std::string path = line.substr(line.find("ORVSG_AdapterFirmware.Name"),
+                                                 line.rfind(" [") - line.find("ORVSG_AdapterFirmware.Name"));
+            const bool unique = line.find(" 2 ") != std::string::npos;
+            NORVTKR20::TCIMReference reference((unique ? c.other : c.baseline), path, {});
+            EXPECT_TRUE(reference.GetCIMElement(false)) << c.what << ": " << path;
+        }
+    }
+}
+
 TEST(DeltaRecords, ThreeCollectionsCompareWithTheFirst) {
     TCollection c0("SN1", "alpha", "20240311141531.000000-300");
     TCollection c1("SN1", "alpha", "20240311141531.000000-300");
