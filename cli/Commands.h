@@ -34,7 +34,10 @@ struct TInfoOptions {
 };
 
 struct TReportOptions {
+    // The files of one collection; with fRecords, one collection argument
+    // each (a directory or FILE[:FILE...]), as compare takes them.
     std::vector<std::string> fFiles;
+    std::string fRecords;  // delta records: makes the report a delta report
     std::string fOutput;
     std::string fFormat = "html";  // "html" or "text"
     std::string fStack = "auto";   // "auto", "base" or "esxi": which report the collection gets
@@ -70,7 +73,7 @@ CLI::App* AddCompareCommand(CLI::App& app, TCompareOptions& options);
 // system and its classes with their instance counts.
 int RunInfo(const TInfoOptions& options, std::ostream& out, std::ostream& err);
 // Writes the report of a collection into a directory and prints the path of
-// its index. Progress goes to `err` when `progressToErr`; a one-line summary
+// its index; with delta records, the delta report of the collections. Progress goes to `err` when `progressToErr`; a one-line summary
 // (pages written, pages without data, page ids not available in this
 // version) goes to `err` in any case.
 int RunReport(const TReportOptions& options, std::ostream& out, std::ostream& err, bool progressToErr);

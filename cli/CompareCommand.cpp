@@ -22,6 +22,8 @@
 #include "braigrion/TReport.h"
 #include "repository/CIMXMLWriter.h"
 #include "repository/DeltaRecords.h"
+#include "repository/MemoryClass.h"
+#include "repository/MemoryInstance.h"
 #include "repository/NamespaceView.h"
 
 namespace braigrion {
@@ -91,10 +93,42 @@ CLI::App* AddCompareCommand(CLI::App& app, TCompareOptions& options) {
     return command;
 }
 
+namespace {
+
+// Delta records read from a file must fit the collections they are used
+// with: a record that names a collection beyond the last, or of a type the
+// report does not know, means the file was made for other collections.
+void CheckRecords(repository::TMemoryNamespace& records, const std::string& file, size_t collections) {
+    if (!records.FindClass("ORVSG_DeltaClass")) throw TInputError(file + ": holds no delta records (no ORVSG_DeltaClass)");
+    repository::TMemoryClass* deltas = records.FindClass("ORVSG_Delta");
+    if (!deltas) return;
+    for (const auto& record : deltas->GetInstances()) {
+        const repository::TMemoryInstance::TSlot* id = record->FindSlot("InstanceID");
+        const std::string name = "record \"" + (id && !id->fValue.IsNull() ? id->fValue.ToString(10) : "") + "\"";
+        const repository::TMemoryInstance::TSlot* type = record->FindSlot("Type");
+        const std::string typeText = type && !type->fValue.IsNull() ? type->fValue.ToString(10) : "";
+        if (typeText != "1" && typeText != "2" && typeText != "4") {
+            throw TInputError(file + ": " + name + " has Type \"" + typeText + "\"; known types are 1, 2 and 4");
+        }
+        const repository::TMemoryInstance::TSlot* indices = record->FindSlot("NamespaceIndices");
+        if (!indices || indices->fValue.IsNull() || !indices->fValue.IsArray()) continue;
+        for (const NORVTKR20::TCIMValue& index : static_cast<const std::vector<NORVTKR20::TCIMValue>&>(indices->fValue)) {
+            const std::string text = index.IsNull() ? "" : index.ToString(10);
+            if (text.empty() || text.find_first_not_of("0123456789") != std::string::npos ||
+                text.size() > 5 || std::stoul(text) >= collections) {
+                throw TInputError(file + ": " + name + " names collection \"" + text + "\", but " +
+                                  std::to_string(collections) + " collections were given (numbered from 0)");
+            }
+        }
+    }
+}
+
+}  // namespace
+
 int RunCompare(const TCompareOptions& options, std::ostream& out, std::ostream& err, bool progressToErr) {
     // Everything the user gave is checked before anything is written.
     SetUpLog(options.fRun);
-    if (options.fCollections.size() < 2) throw TInputError("compare needs at least two collections");
+    if (options.fCollections.size() < 2) throw TInputError("a delta report needs at least two collections");
     if (!options.fRecords.empty() && !options.fSaveRecords.empty()) {
         throw TInputError("--records and --save-records exclude each other");
     }
@@ -108,14 +142,17 @@ int RunCompare(const TCompareOptions& options, std::ostream& out, std::ostream& 
     boost::shared_ptr<repository::TMemoryNamespace> records;
     if (!options.fRecords.empty()) {
         records = LoadFiles({options.fRecords}).fNamespace;
-        if (!records->FindClass("ORVSG_DeltaClass")) {
-            throw TInputError(options.fRecords + ": holds no delta records (no ORVSG_DeltaClass)");
-        }
+        CheckRecords(*records, options.fRecords, collections.size());
     }
     TReportDirectory directory(options.fOutput, options.fForce);
 
     if (!records) {
-        records = repository::ComputeDeltaRecords(collections);
+        repository::TDeltaSummary summary;
+        records = repository::ComputeDeltaRecords(collections, &summary);
+        for (const std::string& className : summary.fNamedByValues) {
+            err << "braigrion: warning: " << className
+                << ": the keys do not tell its instances apart; they were matched by their values\n";
+        }
         if (!options.fSaveRecords.empty()) repository::WriteCollectionFile(*records, options.fSaveRecords);
     }
     auto view = boost::make_shared<repository::TNamespaceView>(collections, records);
@@ -129,6 +166,7 @@ int RunCompare(const TCompareOptions& options, std::ostream& out, std::ostream& 
         writer.reset(new backends::THtmlWriter());
         index = "index.html";
     }
+    ApplyLogLinkOptions(options.fRun, *writer);
 
     TContextMap context = MakeContext(options.fRun);
     for (const auto& key : view->MakeContext()) context[key.first] = key.second;
@@ -143,6 +181,7 @@ int RunCompare(const TCompareOptions& options, std::ostream& out, std::ostream& 
     if (!writer->GetFailure().empty()) throw std::runtime_error(writer->GetFailure());
 
     directory.Commit(options.fFormat);
+    err << ReportSummary(*writer) << '\n';
     out << directory.TargetPath() << "/" << index << '\n';
     return 0;
 }

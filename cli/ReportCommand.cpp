@@ -21,30 +21,12 @@
 namespace braigrion {
 namespace cli {
 
-namespace {
-
-// The run's last line: the pages the index lists, those of them without
-// data, and the page ids that this version cannot write yet.
-std::string Summary(const backends::TBackendWriter& writer) {
-    size_t written = 0;
-    size_t withoutData = 0;
-    for (const backends::TBackendWriter::TCategory& category : writer.GetIndex()) {
-        for (const backends::TBackendWriter::TIndexEntry& entry : category.fEntries) {
-            ++written;
-            withoutData += entry.fHasData ? 0 : 1;
-        }
-    }
-    std::string missing;
-    for (const std::string& page : writer.GetUnavailablePages()) missing += (missing.empty() ? "" : " ") + page;
-    return "braigrion: " + std::to_string(written) + " pages written, " + std::to_string(withoutData) +
-           " without data; not available in this version: " + (missing.empty() ? "none" : missing);
-}
-
-}  // namespace
 
 CLI::App* AddReportCommand(CLI::App& app, TReportOptions& options) {
     CLI::App* command = app.add_subcommand("report", "Write the report of a collection into a directory");
-    command->add_option("collection", options.fFiles, "CIM-XML files that together form one collection")
+    command->add_option("collection", options.fFiles,
+                        "CIM-XML files that together form one collection; with --records, one argument per "
+                        "collection (a directory or FILE[:FILE...])")
         ->required()
         ->type_name("FILE");
     command->add_option("-o,--output", options.fOutput, "Directory of the report (replaced when it holds one)")
@@ -57,12 +39,17 @@ CLI::App* AddReportCommand(CLI::App& app, TReportOptions& options) {
                         "Report for a base collection or an ESXi host; auto tells them apart by their classes")
         ->check(CLI::IsMember({"auto", "base", "esxi"}))
         ->capture_default_str();
+    command->add_option("--records", options.fRecords,
+                        "Delta records (as compare --save-records writes them): the delta report of the collections")
+        ->type_name("FILE");
     command->add_flag("--force", options.fForce, "Write into DIR even when it is not an earlier report, among its files; nothing the report did not write is replaced");
     command->add_flag("-q,--quiet", options.fQuiet, "No progress on standard error");
     AddRunOptions(*command, options.fRun);
     command->footer(
         "The report is written beside DIR and moved into place when complete; an earlier report in DIR\n"
         "stays until then. The path of the report's index is printed on standard output.\n"
+        "With --records FILE, each argument is a collection and the first is the baseline: the delta report\n"
+        "of those collections from the records in FILE, the same report compare writes.\n"
         "Environment: TKR_BIOSPROVIDER=yes (in any case) adds the \"BIOS Settings\" page, for collections\n"
         "whose BIOS attribute collector was switched on.");
     return command;
@@ -95,6 +82,19 @@ void RunESXiReport(boost::shared_ptr<NORVTKR20::ICIMNamespace> ns, const TContex
 
 int RunReport(const TReportOptions& options, std::ostream& out, std::ostream& err, bool progressToErr) {
     // Everything the user gave is checked before anything is written.
+    if (!options.fRecords.empty()) {
+        // Collections plus their records are what compare writes from.
+        if (options.fStack == "esxi") throw TInputError("--records makes a delta report, which has no ESXi form");
+        TCompareOptions delta;
+        delta.fCollections = options.fFiles;
+        delta.fRecords = options.fRecords;
+        delta.fOutput = options.fOutput;
+        delta.fFormat = options.fFormat;
+        delta.fForce = options.fForce;
+        delta.fQuiet = options.fQuiet;
+        delta.fRun = options.fRun;
+        return RunCompare(delta, out, err, progressToErr);
+    }
     SetUpLog(options.fRun);
     repository::TLoadResult loaded = LoadFiles(options.fFiles);
     for (const std::string& warning : loaded.fWarnings) err << "braigrion: warning: " << warning << '\n';
@@ -130,7 +130,7 @@ int RunReport(const TReportOptions& options, std::ostream& out, std::ostream& er
     if (!writer->GetFailure().empty()) throw std::runtime_error(writer->GetFailure());
 
     directory.Commit(options.fFormat);
-    err << Summary(*writer) << '\n';
+    err << ReportSummary(*writer) << '\n';
     out << directory.TargetPath() << "/" << index << '\n';
     return 0;
 }

@@ -6,6 +6,7 @@
 #include <cstring>
 
 #include "CollectionLoader.h"
+#include "TBackendWriter.h"
 #include "braigrion/TWriter.h"
 #include "tkrcore/TRootObject.h"
 
@@ -85,6 +86,21 @@ void SetUpLog(const TRunOptions& options) {
         log.SetLogToStderr();
         log.SetLevel(options.fLogLevel);
     }
+}
+
+std::string ReportSummary(const backends::TBackendWriter& writer) {
+    size_t written = 0;
+    size_t withoutData = 0;
+    for (const backends::TBackendWriter::TCategory& category : writer.GetIndex()) {
+        for (const backends::TBackendWriter::TIndexEntry& entry : category.fEntries) {
+            ++written;
+            withoutData += entry.fHasData ? 0 : 1;
+        }
+    }
+    std::string missing;
+    for (const std::string& page : writer.GetUnavailablePages()) missing += (missing.empty() ? "" : " ") + page;
+    return "braigrion: " + std::to_string(written) + " pages written, " + std::to_string(withoutData) +
+           " without data; not available in this version: " + (missing.empty() ? "none" : missing);
 }
 
 }  // namespace cli

@@ -14,6 +14,9 @@ class App;
 
 namespace braigrion {
 class TWriter;
+namespace backends {
+class TBackendWriter;
+}
 }
 
 namespace braigrion {
@@ -37,6 +40,10 @@ void ApplyLogLinkOptions(const TRunOptions& options, TWriter& writer);
 // without a file, a level sends the log to standard error, and without
 // either the log is off. Throws TInputError when the file cannot be opened.
 void SetUpLog(const TRunOptions& options);
+
+// The run's last line: the pages the index lists, those of them without
+// data, and the page ids that this version cannot write yet.
+std::string ReportSummary(const backends::TBackendWriter& writer);
 
 }  // namespace cli
 }  // namespace braigrion

@@ -118,6 +118,29 @@ TEST(CompareCommand, SavedRecordsGiveTheSameReport) {
     EXPECT_NE(std::string::npos, computed.find("Differences"));
     EXPECT_EQ(computed, ReadTree(work / "from-file"));
 
+    // The report command over the same collections and the saved records.
+    cli::TReportOptions report;
+    report.fFiles = options.fCollections;
+    report.fRecords = options.fRecords;
+    report.fFormat = "text";
+    report.fQuiet = true;
+    report.fOutput = (work / "by-report").string();
+    ASSERT_EQ(0, cli::RunReport(report, out, err, false)) << err.str();
+    EXPECT_EQ(computed, ReadTree(work / "by-report"));
+
+    // Records made for other collections: a collection beyond the last, a
+    // type the report does not know.
+    auto recordsFile = [&work](const std::string& name, const std::string& type, const std::string& index) {
+        const fs::path file = work / name;
+        std::ofstream(file) << R"(<?xml version="1.0"?><CIM CIMVERSION="2.0" DTDVERSION="2.0"><DECLARATION><DECLGROUP>
+<VALUE.OBJECT><CLASS NAME="ORVSG_DeltaClass"><PROPERTY NAME="ClassName" TYPE="string"/></CLASS></VALUE.OBJECT>
+<VALUE.OBJECT><INSTANCE CLASSNAME="ORVSG_Delta"><PROPERTY NAME="InstanceID" TYPE="string"><VALUE>Delta:9</VALUE></PROPERTY>
+<PROPERTY NAME="Type" TYPE="uint8"><VALUE>)" << type << R"(</VALUE></PROPERTY>
+<PROPERTY.ARRAY NAME="NamespaceIndices" TYPE="uint16"><VALUE.ARRAY><VALUE>)" << index << R"(</VALUE></VALUE.ARRAY></PROPERTY.ARRAY>
+</INSTANCE></VALUE.OBJECT></DECLGROUP></DECLARATION></CIM>)";
+        return file.string();
+    };
+
     // Input errors name what is wrong.
     const struct {
         std::vector<std::string> collections;
@@ -129,6 +152,10 @@ TEST(CompareCommand, SavedRecordsGiveTheSameReport) {
         {{kSamples + "linux-server", kSamples + "linux-server-peer"}, kSamples + "linux-server/schema.xml",
          "holds no delta records"},
         {{kSamples + "linux-server", "a.xml::b.xml"}, "", "an empty file name"},
+        {{kSamples + "linux-server", kSamples + "linux-server-peer"}, recordsFile("far.xml", "1", "2"),
+         "far.xml: record \"Delta:9\" names collection \"2\", but 2 collections were given"},
+        {{kSamples + "linux-server", kSamples + "linux-server-peer"}, recordsFile("type.xml", "3", "1"),
+         "type.xml: record \"Delta:9\" has Type \"3\""},
     };
     for (const auto& b : bad) {
         cli::TCompareOptions wrong;
