@@ -300,6 +300,12 @@ TEST_F(ReportCommand, RefusesWithOneLineAndTheRightStatus) {
         {Args({"page", "NoSuchPage"}, SampleFiles()), 2, "unknown page id 'NoSuchPage'"},
         // A page of the service mode writes nothing in the default mode.
         {Args({"page", "CFTSetting"}, SampleFiles()), 1, "page CFTSetting has nothing to show .* in default mode"},
+        // The inventory's analysis page is a known id, whose merged devices
+        // this Linux sample has none of.
+        {Args({"page", "Analysis"}, SampleFiles()), 1, "page Analysis has nothing to show"},
+        // Delta records need collections to compare.
+        {Args({"report", "-o", Path("delta"), "--records", Path("none.xml")}, {SampleFiles()[0]}), 2,
+         "a delta report needs at least two collections"},
         {Args({"page", "SystemConfig"}, {malformed}), 2, "broken\\.xml:[0-9]+:[0-9]+: "},
     };
     for (const Case& c : cases) {
