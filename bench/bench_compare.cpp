@@ -2,11 +2,14 @@
 // collection, changes the later one a little, and times the comparison that
 // makes the delta records against the time the two loads took.
 //
-//   bench_compare FILE.xml
+//   bench_compare FILE.xml [--keyless]
 //
 // The later collection loses every 997th instance and has one property
 // changed on every 101st, so that the records of each kind are made. Figures
-// go to standard output one per line as "name: value".
+// go to standard output one per line as "name: value". With --keyless every
+// key of both collections is given one value, as a collector that leaves
+// its keys out would, so that the comparison fails by keys twice and then
+// names each instance by its values.
 
 #include <sys/resource.h>
 
@@ -69,11 +72,25 @@ std::pair<size_t, size_t> Change(TMemoryNamespace& ns) {
     return {deleted, changed};
 }
 
+// Gives every key of every instance one and the same value.
+void Unkey(TMemoryNamespace& ns) {
+    NORVTKR20::TCIMContext none;
+    for (auto* cls : ns.GetClasses()) {
+        if (cls->IsAssociation()) continue;
+        for (const auto& instance : cls->GetInstances()) {
+            for (const std::string& key : cls->GetKeyNames()) {
+                if (instance->FindSlot(key)) instance->GetProperty(key, none)->SetValue(NORVTKR20::TCIMValue("-"), none);
+            }
+        }
+    }
+}
+
 }  // namespace
 
 int main(int argc, char** argv) {
-    if (argc != 2) {
-        std::fprintf(stderr, "usage: bench_compare FILE.xml\n");
+    const bool keyless = argc == 3 && std::string(argv[2]) == "--keyless";
+    if (argc != 2 && !keyless) {
+        std::fprintf(stderr, "usage: bench_compare FILE.xml [--keyless]\n");
         return 2;
     }
     const std::vector<std::string> files{argv[1]};
@@ -85,6 +102,10 @@ int main(int argc, char** argv) {
     auto later = braigrion::repository::LoadCollection(files).fNamespace;
     const double loadLater = Since(start);
     const double loadCpu = CpuSeconds() - cpu;
+    if (keyless) {
+        Unkey(*earlier);
+        Unkey(*later);
+    }
     const auto changes = Change(*later);
 
     braigrion::repository::TDeltaSummary summary;
@@ -100,6 +121,7 @@ int main(int argc, char** argv) {
     std::printf("deleted: %zu\nchanged: %zu\n", changes.first, changes.second);
     std::printf("classes: %zu\nmissing: %zu\nunique: %zu\nproperty_deltas: %zu\n", summary.fClasses,
                 summary.fMissing, summary.fUnique, summary.fPropertyDeltas);
+    std::printf("classes_matched_by_values: %zu\n", summary.fNamedByValues.size());
     std::printf("load_seconds: %.2f + %.2f\n", loadEarlier, loadLater);
     std::printf("compare_seconds: %.2f\n", compare);
     std::printf("compare_over_loads: %.2f\n", compare / (loadEarlier + loadLater));
