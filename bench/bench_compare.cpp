@@ -79,7 +79,8 @@ void Unkey(TMemoryNamespace& ns) {
         if (cls->IsAssociation()) continue;
         for (const auto& instance : cls->GetInstances()) {
             for (const std::string& key : cls->GetKeyNames()) {
-                if (instance->FindSlot(key)) instance->GetProperty(key, none)->SetValue(NORVTKR20::TCIMValue("-"), none);
+                if (!instance->FindSlot(key)) continue;
+                instance->GetProperty(key, none)->SetValue(NORVTKR20::TCIMValue("-"), none);
             }
         }
     }

@@ -73,9 +73,10 @@ CLI::App* AddCompareCommand(CLI::App& app, TCompareOptions& options);
 // system and its classes with their instance counts.
 int RunInfo(const TInfoOptions& options, std::ostream& out, std::ostream& err);
 // Writes the report of a collection into a directory and prints the path of
-// its index; with delta records, the delta report of the collections. Progress goes to `err` when `progressToErr`; a one-line summary
-// (pages written, pages without data, page ids not available in this
-// version) goes to `err` in any case.
+// its index; with delta records, the delta report of the collections.
+// Progress goes to `err` when `progressToErr`; a one-line summary (pages
+// written, pages without data, page ids not available in this version) goes
+// to `err` in any case.
 int RunReport(const TReportOptions& options, std::ostream& out, std::ostream& err, bool progressToErr);
 // Writes the delta report of several collections into a directory and
 // prints the path of its index.

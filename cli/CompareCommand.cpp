@@ -99,7 +99,9 @@ namespace {
 // with: a record that names a collection beyond the last, or of a type the
 // report does not know, means the file was made for other collections.
 void CheckRecords(repository::TMemoryNamespace& records, const std::string& file, size_t collections) {
-    if (!records.FindClass("ORVSG_DeltaClass")) throw TInputError(file + ": holds no delta records (no ORVSG_DeltaClass)");
+    if (!records.FindClass("ORVSG_DeltaClass")) {
+        throw TInputError(file + ": holds no delta records (no ORVSG_DeltaClass)");
+    }
     repository::TMemoryClass* deltas = records.FindClass("ORVSG_Delta");
     if (!deltas) return;
     for (const auto& record : deltas->GetInstances()) {
@@ -112,7 +114,8 @@ void CheckRecords(repository::TMemoryNamespace& records, const std::string& file
         }
         const repository::TMemoryInstance::TSlot* indices = record->FindSlot("NamespaceIndices");
         if (!indices || indices->fValue.IsNull() || !indices->fValue.IsArray()) continue;
-        for (const NORVTKR20::TCIMValue& index : static_cast<const std::vector<NORVTKR20::TCIMValue>&>(indices->fValue)) {
+        const auto& elements = static_cast<const std::vector<NORVTKR20::TCIMValue>&>(indices->fValue);
+        for (const NORVTKR20::TCIMValue& index : elements) {
             const std::string text = index.IsNull() ? "" : index.ToString(10);
             if (text.empty() || text.find_first_not_of("0123456789") != std::string::npos ||
                 text.size() > 5 || std::stoul(text) >= collections) {

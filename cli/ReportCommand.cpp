@@ -21,7 +21,6 @@
 namespace braigrion {
 namespace cli {
 
-
 CLI::App* AddReportCommand(CLI::App& app, TReportOptions& options) {
     CLI::App* command = app.add_subcommand("report", "Write the report of a collection into a directory");
     command->add_option("collection", options.fFiles,
