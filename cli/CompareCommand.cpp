@@ -3,7 +3,6 @@
 #include <CLI/CLI.hpp>
 
 #include <algorithm>
-#include <memory>
 #include <ostream>
 #include <stdexcept>
 
@@ -14,12 +13,8 @@
 
 #include "CollectionLoader.h"
 #include "Commands.h"
-#include "Progress.h"
 #include "ReportDirectory.h"
 #include "RunContext.h"
-#include "THtmlWriter.h"
-#include "TTextWriter.h"
-#include "braigrion/TReport.h"
 #include "repository/CIMXMLWriter.h"
 #include "repository/DeltaRecords.h"
 #include "repository/MemoryClass.h"
@@ -160,32 +155,9 @@ int RunCompare(const TCompareOptions& options, std::ostream& out, std::ostream& 
     }
     auto view = boost::make_shared<repository::TNamespaceView>(collections, records);
 
-    std::unique_ptr<backends::TBackendWriter> writer;
-    std::string index;
-    if (options.fFormat == "text") {
-        writer.reset(new backends::TTextWriter());
-        index = "index.txt";
-    } else {
-        writer.reset(new backends::THtmlWriter());
-        index = "index.html";
-    }
-    ApplyLogLinkOptions(options.fRun, *writer);
-
     TContextMap context = MakeContext(options.fRun);
     for (const auto& key : view->MakeContext()) context[key.first] = key.second;
-    TReport report(view, context, directory.WorkPath());
-    {
-        TProgressLine progress(err, progressToErr && !options.fQuiet);
-        report.SetPageObserver([&progress](size_t number, size_t total, const std::string& page) {
-            progress.Page(number, total, page);
-        });
-        report.Write(writer.get(), context);
-    }
-    if (!writer->GetFailure().empty()) throw std::runtime_error(writer->GetFailure());
-
-    directory.Commit(options.fFormat);
-    err << ReportSummary(*writer) << '\n';
-    out << directory.TargetPath() << "/" << index << '\n';
+    WriteReport(view, context, options.fRun, options.fFormat, progressToErr && !options.fQuiet, directory, out, err);
     return 0;
 }
 

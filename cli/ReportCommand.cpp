@@ -1,22 +1,17 @@
 // braigrion report: the whole report of a collection, as HTML or text.
 #include <CLI/CLI.hpp>
 
-#include <memory>
 #include <ostream>
 #include <stdexcept>
 #include <string>
 
 #include "CollectionLoader.h"
 #include "Commands.h"
-#include "Progress.h"
 #include "ReportDirectory.h"
 #include "RunContext.h"
-#include "THtmlWriter.h"
 #include "THtmlWriter_vmwesxi.h"
 #include "TReport_vmwesxi.h"
-#include "TTextWriter.h"
 #include "TTextWriter_vmwesxi.h"
-#include "braigrion/TReport.h"
 
 namespace braigrion {
 namespace cli {
@@ -110,27 +105,8 @@ int RunReport(const TReportOptions& options, std::ostream& out, std::ostream& er
         return 0;
     }
 
-    std::unique_ptr<backends::TBackendWriter> writer;
-    if (options.fFormat == "text") {
-        writer.reset(new backends::TTextWriter());
-    } else {
-        writer.reset(new backends::THtmlWriter());
-    }
-
-    ApplyLogLinkOptions(options.fRun, *writer);
-    TReport report(loaded.fNamespace, context, directory.WorkPath());
-    {
-        TProgressLine progress(err, progressToErr && !options.fQuiet);
-        report.SetPageObserver([&progress](size_t number, size_t total, const std::string& page) {
-            progress.Page(number, total, page);
-        });
-        report.Write(writer.get(), context);
-    }
-    if (!writer->GetFailure().empty()) throw std::runtime_error(writer->GetFailure());
-
-    directory.Commit(options.fFormat);
-    err << ReportSummary(*writer) << '\n';
-    out << directory.TargetPath() << "/" << index << '\n';
+    WriteReport(loaded.fNamespace, context, options.fRun, options.fFormat, progressToErr && !options.fQuiet, directory,
+                out, err);
     return 0;
 }
 

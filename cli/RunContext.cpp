@@ -5,8 +5,16 @@
 #include <cerrno>
 #include <cstring>
 
+#include <memory>
+#include <ostream>
+#include <stdexcept>
+
 #include "CollectionLoader.h"
-#include "TBackendWriter.h"
+#include "Progress.h"
+#include "ReportDirectory.h"
+#include "THtmlWriter.h"
+#include "TTextWriter.h"
+#include "braigrion/TReport.h"
 #include "braigrion/TWriter.h"
 #include "tkrcore/TRootObject.h"
 
@@ -88,6 +96,10 @@ void SetUpLog(const TRunOptions& options) {
     }
 }
 
+namespace {
+
+// The run's last line: the pages the index lists, those of them without
+// data, and the page ids that this version cannot write yet.
 std::string ReportSummary(const backends::TBackendWriter& writer) {
     size_t written = 0;
     size_t withoutData = 0;
@@ -101,6 +113,33 @@ std::string ReportSummary(const backends::TBackendWriter& writer) {
     for (const std::string& page : writer.GetUnavailablePages()) missing += (missing.empty() ? "" : " ") + page;
     return "braigrion: " + std::to_string(written) + " pages written, " + std::to_string(withoutData) +
            " without data; not available in this version: " + (missing.empty() ? "none" : missing);
+}
+
+}  // namespace
+
+void WriteReport(boost::shared_ptr<NORVTKR20::ICIMNamespace> ns, const TContextMap& context, const TRunOptions& run,
+                 const std::string& format, bool showProgress, TReportDirectory& directory, std::ostream& out,
+                 std::ostream& err) {
+    std::unique_ptr<backends::TBackendWriter> writer;
+    if (format == "text") {
+        writer.reset(new backends::TTextWriter());
+    } else {
+        writer.reset(new backends::THtmlWriter());
+    }
+    ApplyLogLinkOptions(run, *writer);
+    TReport report(ns, context, directory.WorkPath());
+    {
+        TProgressLine progress(err, showProgress);
+        report.SetPageObserver([&progress](size_t number, size_t total, const std::string& page) {
+            progress.Page(number, total, page);
+        });
+        report.Write(writer.get(), context);
+    }
+    if (!writer->GetFailure().empty()) throw std::runtime_error(writer->GetFailure());
+
+    directory.Commit(format);
+    err << ReportSummary(*writer) << '\n';
+    out << directory.TargetPath() << "/" << (format == "text" ? "index.txt" : "index.html") << '\n';
 }
 
 }  // namespace cli

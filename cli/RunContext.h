@@ -1,9 +1,13 @@
-// What the report and page commands share: the context map a report is
-// written under, the options that set it, and the log.
+// What the report, compare and page commands share: the context map a report
+// is written under, the options that set it, the log, and the writing of a
+// report into its directory.
 #pragma once
 
+#include <iosfwd>
 #include <map>
 #include <string>
+
+#include <boost/shared_ptr.hpp>
 
 #include "Commands.h"
 #include "tkrcore/TCIMValue.h"
@@ -12,11 +16,12 @@ namespace CLI {
 class App;
 }
 
+namespace NORVTKR20 {
+class ICIMNamespace;
+}
+
 namespace braigrion {
 class TWriter;
-namespace backends {
-class TBackendWriter;
-}
 }
 
 namespace braigrion {
@@ -41,9 +46,17 @@ void ApplyLogLinkOptions(const TRunOptions& options, TWriter& writer);
 // either the log is off. Throws TInputError when the file cannot be opened.
 void SetUpLog(const TRunOptions& options);
 
-// The run's last line: the pages the index lists, those of them without
-// data, and the page ids that this version cannot write yet.
-std::string ReportSummary(const backends::TBackendWriter& writer);
+class TReportDirectory;
+
+// Writes the report of `ns` (a collection, or a view of several with their
+// delta records) through the back-end of `format` into the directory's work
+// path, with progress on `err` when `showProgress`, and puts it in place.
+// Then prints the run's last line to `err` (pages written, those without
+// data, page ids not available in this version) and the index's path to
+// `out`. A back-end's failure to write is thrown.
+void WriteReport(boost::shared_ptr<NORVTKR20::ICIMNamespace> ns, const TContextMap& context, const TRunOptions& run,
+                 const std::string& format, bool showProgress, TReportDirectory& directory, std::ostream& out,
+                 std::ostream& err);
 
 }  // namespace cli
 }  // namespace braigrion
