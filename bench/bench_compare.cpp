@@ -18,6 +18,7 @@
 #include <string>
 #include <vector>
 
+#include "BenchClock.h"
 #include "repository/CIMXMLReader.h"
 #include "repository/DeltaRecords.h"
 #include "repository/MemoryClass.h"
@@ -25,20 +26,11 @@
 
 namespace {
 
+using bench::CpuSeconds;
+using bench::PeakKiB;
+using bench::SecondsSince;
+
 using braigrion::repository::TMemoryNamespace;
-
-double Since(std::chrono::steady_clock::time_point start) {
-    return std::chrono::duration<double>(std::chrono::steady_clock::now() - start).count();
-}
-
-// CPU seconds of the process so far: on a shared machine a fairer measure
-// of each step than the wall clock.
-double CpuSeconds() {
-    rusage usage{};
-    getrusage(RUSAGE_SELF, &usage);
-    return static_cast<double>(usage.ru_utime.tv_sec + usage.ru_stime.tv_sec) +
-           static_cast<double>(usage.ru_utime.tv_usec + usage.ru_stime.tv_usec) / 1e6;
-}
 
 // Deletes every 997th instance and rewrites a string property of every
 // 101st; returns how many of each.
@@ -98,10 +90,10 @@ int main(int argc, char** argv) {
     double cpu = CpuSeconds();
     auto start = std::chrono::steady_clock::now();
     auto earlier = braigrion::repository::LoadCollection(files).fNamespace;
-    const double loadEarlier = Since(start);
+    const double loadEarlier = SecondsSince(start);
     start = std::chrono::steady_clock::now();
     auto later = braigrion::repository::LoadCollection(files).fNamespace;
-    const double loadLater = Since(start);
+    const double loadLater = SecondsSince(start);
     const double loadCpu = CpuSeconds() - cpu;
     if (keyless) {
         Unkey(*earlier);
@@ -113,11 +105,9 @@ int main(int argc, char** argv) {
     cpu = CpuSeconds();
     start = std::chrono::steady_clock::now();
     auto records = braigrion::repository::ComputeDeltaRecords({earlier, later}, &summary);
-    const double compare = Since(start);
+    const double compare = SecondsSince(start);
     const double compareCpu = CpuSeconds() - cpu;
 
-    rusage usage{};
-    getrusage(RUSAGE_SELF, &usage);
     std::printf("instances: %zu\n", earlier->GetInstanceCount());
     std::printf("deleted: %zu\nchanged: %zu\n", changes.first, changes.second);
     std::printf("classes: %zu\nmissing: %zu\nunique: %zu\nproperty_deltas: %zu\n", summary.fClasses,
@@ -128,6 +118,6 @@ int main(int argc, char** argv) {
     std::printf("compare_over_loads: %.2f\n", compare / (loadEarlier + loadLater));
     std::printf("cpu_seconds: loads %.2f, compare %.2f (%.2f of the loads)\n", loadCpu, compareCpu,
                 compareCpu / loadCpu);
-    std::printf("peak_rss_mib: %ld\n", usage.ru_maxrss / 1024);
+    std::printf("peak_rss_mib: %ld\n", PeakKiB() / 1024);
     return 0;
 }

@@ -18,25 +18,20 @@
 
 #include <boost/make_shared.hpp>
 
+#include "BenchClock.h"
 #include "TTextWriter.h"
 #include "braigrion/ReportDefinition.h"
 #include "repository/MemoryRepository.h"
 
 namespace {
 
+using bench::CpuSeconds;
+using bench::PeakKiB;
+using bench::SecondsSince;
+
 using NORVTKR20::TCIMValue;
 typedef NORVTKR20::TCIMValue::TCIMType TType;
 namespace repository = braigrion::repository;
-
-long PeakKiB() {
-    struct rusage usage;
-    getrusage(RUSAGE_SELF, &usage);
-    return usage.ru_maxrss;
-}
-
-double SecondsSince(std::chrono::steady_clock::time_point start) {
-    return std::chrono::duration<double>(std::chrono::steady_clock::now() - start).count();
-}
 
 repository::TPropertyValue Text(const std::string& name, const std::string& text) {
     repository::TPropertyValue property;

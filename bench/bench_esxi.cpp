@@ -17,36 +17,22 @@
 #include <filesystem>
 #include <string>
 
+#include "BenchClock.h"
 #include "TReport_vmwesxi.h"
 #include "TTextWriter_vmwesxi.h"
 #include "repository/MemoryRepository.h"
 
 namespace {
 
+using bench::CpuSeconds;
+using bench::PeakKiB;
+using bench::SecondsSince;
+
 using braigrion::repository::TMemoryNamespace;
 using braigrion::repository::TPropertyValue;
 using NORVTKR20::TCIMDateTime;
 using NORVTKR20::TCIMValue;
 typedef NORVTKR20::TCIMValue::TCIMType TType;
-
-long PeakKiB() {
-    rusage usage{};
-    getrusage(RUSAGE_SELF, &usage);
-    return usage.ru_maxrss;  // KiB on Linux
-}
-
-// Processor time of the process so far: steadier than the clock on a
-// machine that others share.
-double CpuSeconds() {
-    rusage usage{};
-    getrusage(RUSAGE_SELF, &usage);
-    return static_cast<double>(usage.ru_utime.tv_sec + usage.ru_stime.tv_sec) +
-           static_cast<double>(usage.ru_utime.tv_usec + usage.ru_stime.tv_usec) / 1e6;
-}
-
-double SecondsSince(std::chrono::steady_clock::time_point start) {
-    return std::chrono::duration<double>(std::chrono::steady_clock::now() - start).count();
-}
 
 TPropertyValue Value(const std::string& name, const TCIMValue& value, TType::ECIMType type) {
     TPropertyValue property;

@@ -29,6 +29,7 @@
 #include <string>
 #include <vector>
 
+#include "BenchClock.h"
 #include "braigrion/ReportDefinition.h"
 #include "braigrion/TWriter.h"
 #include "repository/CIMXMLReader.h"
@@ -36,6 +37,10 @@
 #include "repository/MemoryRepository.h"
 
 namespace {
+
+using bench::CpuSeconds;
+using bench::PeakKiB;
+using bench::SecondsSince;
 
 using braigrion::TReportParameters;
 using braigrion::TReportParametersBuilder;
@@ -46,25 +51,6 @@ using NORVTKR20::TCIMDateTime;
 using NORVTKR20::TCIMValue;
 typedef NORVTKR20::TCIMValue::TCIMType TType;
 namespace repo = braigrion::repository;
-
-long PeakKiB() {
-    rusage usage{};
-    getrusage(RUSAGE_SELF, &usage);
-    return usage.ru_maxrss;
-}
-
-double SecondsSince(std::chrono::steady_clock::time_point start) {
-    return std::chrono::duration<double>(std::chrono::steady_clock::now() - start).count();
-}
-
-// CPU seconds of the process so far: on a shared machine the wall time
-// also counts the neighbours.
-double CpuSeconds() {
-    rusage usage{};
-    getrusage(RUSAGE_SELF, &usage);
-    return static_cast<double>(usage.ru_utime.tv_sec + usage.ru_stime.tv_sec) +
-           static_cast<double>(usage.ru_utime.tv_usec + usage.ru_stime.tv_usec) / 1e6;
-}
 
 // A back-end that renders what a real one would (each value cell's text,
 // each grid) and keeps only counts.

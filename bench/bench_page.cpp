@@ -21,12 +21,17 @@
 #include <string>
 #include <vector>
 
+#include "BenchClock.h"
 #include "braigrion/TWriter.h"
 #include "repository/CIMXMLReader.h"
 #include "repository/CIMXMLWriter.h"
 #include "repository/MemoryRepository.h"
 
 namespace {
+
+using bench::CpuSeconds;
+using bench::PeakKiB;
+using bench::SecondsSince;
 
 using braigrion::TReportClass;
 using braigrion::TReportParameters;
@@ -36,16 +41,6 @@ using braigrion::TWriter;
 using NORVTKR20::TCIMDateTime;
 using NORVTKR20::TCIMValue;
 typedef NORVTKR20::TCIMValue::TCIMType TType;
-
-long PeakKiB() {
-    rusage usage{};
-    getrusage(RUSAGE_SELF, &usage);
-    return usage.ru_maxrss;  // KiB on Linux
-}
-
-double SecondsSince(std::chrono::steady_clock::time_point start) {
-    return std::chrono::duration<double>(std::chrono::steady_clock::now() - start).count();
-}
 
 // A back-end that takes everything and keeps nothing but a count of cells.
 class TDiscardingWriter : public TWriter {

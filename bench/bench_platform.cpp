@@ -20,10 +20,15 @@
 
 #include <boost/make_shared.hpp>
 
+#include "BenchClock.h"
 #include "THtmlWriter.h"
 #include "repository/MemoryRepository.h"
 
 namespace {
+
+using bench::CpuSeconds;
+using bench::PeakKiB;
+using bench::SecondsSince;
 
 using braigrion::repository::TClassData;
 using braigrion::repository::TMemoryNamespace;
@@ -32,16 +37,6 @@ using braigrion::repository::TPropertyValue;
 using NORVTKR20::TCIMReference;
 using NORVTKR20::TCIMValue;
 typedef NORVTKR20::TCIMValue::TCIMType TType;
-
-long PeakKiB() {
-    rusage usage{};
-    getrusage(RUSAGE_SELF, &usage);
-    return usage.ru_maxrss;  // KiB on Linux
-}
-
-double SecondsSince(std::chrono::steady_clock::time_point start) {
-    return std::chrono::duration<double>(std::chrono::steady_clock::now() - start).count();
-}
 
 TPropertyValue Value(const std::string& name, const TCIMValue& value) {
     TPropertyValue property;

@@ -19,6 +19,7 @@
 #include <string>
 #include <vector>
 
+#include "BenchClock.h"
 #include "THtmlWriter.h"
 #include "braigrion/TReport.h"
 #include "repository/CIMXMLReader.h"
@@ -28,25 +29,12 @@
 
 namespace {
 
+using bench::CpuSeconds;
+using bench::PeakKiB;
+using bench::SecondsSince;
+
 namespace fs = std::filesystem;
 typedef std::chrono::steady_clock TClock;
-
-double Since(TClock::time_point start) { return std::chrono::duration<double>(TClock::now() - start).count(); }
-
-long PeakKiB() {
-    rusage usage{};
-    getrusage(RUSAGE_SELF, &usage);
-    return usage.ru_maxrss;  // KiB on Linux
-}
-
-// CPU seconds of the process so far: on a shared machine a steadier measure
-// than the wall clock.
-double CpuSeconds() {
-    rusage usage{};
-    getrusage(RUSAGE_SELF, &usage);
-    return static_cast<double>(usage.ru_utime.tv_sec + usage.ru_stime.tv_sec) +
-           static_cast<double>(usage.ru_utime.tv_usec + usage.ru_stime.tv_usec) / 1e6;
-}
 
 }  // namespace
 
@@ -83,11 +71,11 @@ int main(int argc, char** argv) {
         std::fprintf(stderr, "bench_report: %s\n", ex.what());
         return 1;
     }
-    const double parse = Since(loadStart);
+    const double parse = SecondsSince(loadStart);
     const auto linkStart = TClock::now();
     loaded.fNamespace->Indexes().BuildLinksNow();
-    const double links = Since(linkStart);
-    const double load = Since(loadStart);
+    const double links = SecondsSince(linkStart);
+    const double load = SecondsSince(loadStart);
     const double loadCpu = CpuSeconds() - cpuStart;
     const long loadPeak = PeakKiB();
 
@@ -105,7 +93,7 @@ int main(int argc, char** argv) {
         report.Write(&writer, context);
         if (!writer.GetFailure().empty()) std::fprintf(stderr, "bench_report: %s\n", writer.GetFailure().c_str());
     }
-    const double report = Since(reportStart);
+    const double report = SecondsSince(reportStart);
     const double reportCpu = CpuSeconds() - cpuStart - loadCpu;
     const long peak = PeakKiB();
     unsigned long long written = 0;

@@ -21,25 +21,20 @@
 
 #include <boost/make_shared.hpp>
 
+#include "BenchClock.h"
 #include "THtmlWriter.h"
 #include "braigrion/ReportDefinition.h"
 #include "repository/MemoryRepository.h"
 
 namespace {
 
+using bench::CpuSeconds;
+using bench::PeakKiB;
+using bench::SecondsSince;
+
 using braigrion::repository::TMemoryNamespace;
 using braigrion::repository::TPropertyValue;
 using NORVTKR20::TCIMValue;
-
-long PeakKiB() {
-    rusage usage{};
-    getrusage(RUSAGE_SELF, &usage);
-    return usage.ru_maxrss;
-}
-
-double SecondsSince(std::chrono::steady_clock::time_point start) {
-    return std::chrono::duration<double>(std::chrono::steady_clock::now() - start).count();
-}
 
 TPropertyValue Value(const std::string& name, const TCIMValue& value) {
     TPropertyValue property;
