@@ -17,8 +17,7 @@
 const fs = require('fs');
 const path = require('path');
 const { naturalCompare } = require('../../backends/assets/tkr_sort.js');
-
-const SKIP = 77;
+const { check, openFromNavigation, openReport, run } = require('./support.js');
 
 function parseArguments(argv) {
   const options = { expect: [] };
@@ -45,26 +44,6 @@ function parseArguments(argv) {
   return options;
 }
 
-function escapeRegExp(text) {
-  return text.replace(/[.*+?^${}()|[\]\\]/g, '\\$&');
-}
-
-// Clicks the navigation link of a page and waits until the page frame shows
-// it. Returns the frame and whether the link marks the page as without data.
-async function openPage(page, name) {
-  const nav = page.frameLocator('iframe[name="nav_frame"]');
-  const text = new RegExp(`^\\s*${escapeRegExp(name)}(\\s*\\(no data\\))?\\s*$`);
-  const link = nav.locator('#navbar a', { hasText: text }).first();
-  await link.waitFor({ timeout: 10000 });
-  const target = await link.getAttribute('href');
-  const noData = ((await link.getAttribute('class')) || '').split(/\s+/).includes('nodata');
-  await link.click();
-  const data = page.frame({ name: 'data_frame' });
-  check(data, 'no frame named data_frame');
-  await data.waitForURL((url) => url.pathname.endsWith('/' + target), { timeout: 10000 });
-  return { data, noData };
-}
-
 // The table right under the title `title` (of a table written in several
 // grids, the first), or when the title is empty the first table of the
 // page that shows `value`; `value` must show in one of its cells.
@@ -84,104 +63,67 @@ async function tableShowing(data, title, value) {
   return table;
 }
 
-function findChromium() {
-  const candidates = [process.env.CHROMIUM, '/usr/bin/chromium', '/usr/bin/chromium-browser'];
-  return candidates.find((file) => file && fs.existsSync(file));
-}
-
-function check(condition, message) {
-  if (!condition) throw new Error(message);
-}
-
 // The texts of one column of the table's body, top to bottom.
 async function columnTexts(table, column) {
   return table.evaluate((element, index) =>
     Array.from(element.tBodies[0].rows).map((row) => row.cells[index].textContent.trim()), column);
 }
 
-async function main() {
-  const options = parseArguments(process.argv.slice(2));
-  let playwright;
-  try {
-    playwright = require('playwright-core');
-  } catch (error) {
-    console.log('SKIP: playwright-core is not installed (scripts/setup.sh --tests installs it)');
-    return SKIP;
+const options = parseArguments(process.argv.slice(2));
+
+run(async (browser) => {
+  const { page, checkErrors } = await openReport(browser, options.report);
+
+  // Each page expected filled: opened from the navigation, a table of it
+  // showing a known value.
+  for (const expected of options.expect) {
+    const { data, noData } = await openFromNavigation(page, expected.page);
+    check(!noData, `the navigation marks "${expected.page}" as without data`);
+    await tableShowing(data, expected.table, expected.value);
   }
-  const chromium = findChromium();
-  if (!chromium) {
-    console.log('SKIP: no Chromium installed (scripts/setup.sh installs it)');
-    return SKIP;
-  }
-
-  const index = path.resolve(options.report, 'index.html');
-  check(fs.existsSync(index), `no report index at ${index}`);
-  const browser = await playwright.chromium.launch({ executablePath: chromium, args: ['--no-sandbox'] });
-  try {
-    const page = await browser.newPage({ viewport: { width: 1280, height: 800 } });
-    const errors = [];
-    page.on('pageerror', (error) => errors.push(error.message));
-    await page.goto('file://' + index);
-
-    // Each page expected filled: opened from the navigation, a table of it
-    // showing a known value.
-    for (const expected of options.expect) {
-      const { data, noData } = await openPage(page, expected.page);
-      check(!noData, `the navigation marks "${expected.page}" as without data`);
-      await tableShowing(data, expected.table, expected.value);
-    }
-    check(errors.length === 0, `script errors: ${errors.join('; ')}`);
-    if (!options.sort) {
-      if (options.screenshot) {
-        fs.mkdirSync(path.dirname(path.resolve(options.screenshot)), { recursive: true });
-        await page.screenshot({ path: options.screenshot });
-      }
-      console.log(`ok: ${options.expect.length} pages open from the navigation and show their tables`);
-      return 0;
-    }
-
-    // Navigation: the link in the left frame opens the page in the right one.
-    const { data } = await openPage(page, options.page);
-
-    // The table under its title, holding the known value.
-    const table = await tableShowing(data, options.table, options.value);
-
-    // Sorting by a header click, ascending then descending.
-    check(await table.evaluate((element) => element.classList.contains('sortable')), 'the table is not sortable');
-    const header = table.locator('thead th', { hasText: options.sort }).first();
-    const column = await header.evaluate((element) => element.cellIndex);
-    const before = await columnTexts(table, column);
-    const ascending = [...before].sort(naturalCompare);
-    const descending = [...before].sort((a, b) => naturalCompare(b, a));
-    check(before.length > 1, 'the table has fewer than two rows to sort');
-    await header.click();
-    const up = await columnTexts(table, column);
-    check(JSON.stringify(up) === JSON.stringify(ascending), `ascending order is ${JSON.stringify(up)}`);
-    if (options.order) {
-      const expected = options.order.split(',');
-      check(JSON.stringify(up) === JSON.stringify(expected), `ascending order ${JSON.stringify(up)}, expected ${JSON.stringify(expected)}`);
-    }
-    check(await header.getAttribute('aria-sort') === 'ascending', 'the header does not show the ascending sort');
-    await header.click();
-    const down = await columnTexts(table, column);
-    check(JSON.stringify(down) === JSON.stringify(descending), `descending order is ${JSON.stringify(down)}`);
-    check(errors.length === 0, `script errors: ${errors.join('; ')}`);
-
-    await header.click();  // back to ascending for the picture
+  checkErrors();
+  if (!options.sort) {
     if (options.screenshot) {
       fs.mkdirSync(path.dirname(path.resolve(options.screenshot)), { recursive: true });
       await page.screenshot({ path: options.screenshot });
     }
-    console.log(`ok: ${options.expect.length} pages show their tables; "${options.page}" opens in the frame, ` +
-                `table "${options.table}" shows "${options.value}", ` +
-                `sorting by "${options.sort}" works both ways (${up.length} rows)`);
-    return 0;
-  } finally {
-    await browser.close();
+    console.log(`ok: ${options.expect.length} pages open from the navigation and show their tables`);
+    return;
   }
-}
 
-main().then((status) => process.exit(status), (error) => {
-  console.error(`FAIL: ${error.message}`);
-  process.exit(1);
+  // Navigation: the link in the left frame opens the page in the right one.
+  const { data } = await openFromNavigation(page, options.page);
+
+  // The table under its title, holding the known value.
+  const table = await tableShowing(data, options.table, options.value);
+
+  // Sorting by a header click, ascending then descending.
+  check(await table.evaluate((element) => element.classList.contains('sortable')), 'the table is not sortable');
+  const header = table.locator('thead th', { hasText: options.sort }).first();
+  const column = await header.evaluate((element) => element.cellIndex);
+  const before = await columnTexts(table, column);
+  const ascending = [...before].sort(naturalCompare);
+  const descending = [...before].sort((a, b) => naturalCompare(b, a));
+  check(before.length > 1, 'the table has fewer than two rows to sort');
+  await header.click();
+  const up = await columnTexts(table, column);
+  check(JSON.stringify(up) === JSON.stringify(ascending), `ascending order is ${JSON.stringify(up)}`);
+  if (options.order) {
+    const expected = options.order.split(',');
+    check(JSON.stringify(up) === JSON.stringify(expected), `ascending order ${JSON.stringify(up)}, expected ${JSON.stringify(expected)}`);
+  }
+  check(await header.getAttribute('aria-sort') === 'ascending', 'the header does not show the ascending sort');
+  await header.click();
+  const down = await columnTexts(table, column);
+  check(JSON.stringify(down) === JSON.stringify(descending), `descending order is ${JSON.stringify(down)}`);
+  checkErrors();
+
+  await header.click();  // back to ascending for the picture
+  if (options.screenshot) {
+    fs.mkdirSync(path.dirname(path.resolve(options.screenshot)), { recursive: true });
+    await page.screenshot({ path: options.screenshot });
+  }
+  console.log(`ok: ${options.expect.length} pages show their tables; "${options.page}" opens in the frame, ` +
+              `table "${options.table}" shows "${options.value}", ` +
+              `sorting by "${options.sort}" works both ways (${up.length} rows)`);
 });

@@ -12,6 +12,8 @@ const scripts = {
   'report.test.js': ['--report', 'no-report', '--expect', 'Page||value'],
   'rawdata.test.js': ['--report', 'no-report', '--page', 'P', '--raw-title', 'R', '--result', 'x'],
   'tokens.test.js': ['--report', 'no-report'],
+  'logs.test.js': ['--report', 'no-report', '--server', 'http://docs', '--event', '1', '--files', 'messages'],
+  'delta.test.js': ['--report', 'no-report'],
 };
 
 for (const [script, args] of Object.entries(scripts)) {

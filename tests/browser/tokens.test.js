@@ -15,8 +15,7 @@
 
 const fs = require('fs');
 const path = require('path');
-
-const SKIP = 77;
+const { run } = require('./support.js');
 
 function parseArguments(argv) {
   const options = { report: [], window: [] };
@@ -33,11 +32,6 @@ function parseArguments(argv) {
     return { width: Number(match[1]), height: Number(match[2]) };
   });
   return options;
-}
-
-function findChromium() {
-  const candidates = [process.env.CHROMIUM, '/usr/bin/chromium', '/usr/bin/chromium-browser'];
-  return candidates.find((file) => file && fs.existsSync(file));
 }
 
 // Runs in the page: the tokens of table cells that stand on more than one
@@ -67,60 +61,37 @@ function brokenTokens() {
   return { checked, broken };
 }
 
-async function main() {
-  const options = parseArguments(process.argv.slice(2));
-  let playwright;
-  try {
-    playwright = require('playwright-core');
-  } catch (error) {
-    console.log('SKIP: playwright-core is not installed (scripts/setup.sh --tests installs it)');
-    return SKIP;
-  }
-  const chromium = findChromium();
-  if (!chromium) {
-    console.log('SKIP: no Chromium installed (scripts/setup.sh installs it)');
-    return SKIP;
-  }
+const options = parseArguments(process.argv.slice(2));
 
+run(async (browser) => {
   const failures = [];
   let pages = 0;
   let tokens = 0;
-  const browser = await playwright.chromium.launch({ executablePath: chromium, args: ['--no-sandbox'] });
-  try {
-    for (const report of options.report) {
-      const index = path.resolve(report, 'index.html');
-      if (!fs.existsSync(index)) throw new Error(`no report index at ${index}`);
-      for (const viewport of options.window) {
-        const page = await browser.newPage({ viewport });
-        await page.goto('file://' + index);
-        const nav = page.frame({ name: 'nav_frame' });
-        const data = page.frame({ name: 'data_frame' });
-        if (!nav || !data) throw new Error(`${index}: no navigation or page frame`);
-        await nav.waitForSelector('#navbar a', { state: 'attached', timeout: 10000 });
-        const links = await nav.$$eval('#navbar a', (anchors) => anchors.map((a) => a.getAttribute('href')));
-        for (const link of links) {
-          await data.goto('file://' + path.resolve(report, link));
-          const result = await data.evaluate(brokenTokens);
-          ++pages;
-          tokens += result.checked;
-          for (const token of result.broken) {
-            failures.push(`${path.basename(report)}/${link} at ${viewport.width}x${viewport.height}: ${token}`);
-          }
+  for (const report of options.report) {
+    const index = path.resolve(report, 'index.html');
+    if (!fs.existsSync(index)) throw new Error(`no report index at ${index}`);
+    for (const viewport of options.window) {
+      const page = await browser.newPage({ viewport });
+      await page.goto('file://' + index);
+      const nav = page.frame({ name: 'nav_frame' });
+      const data = page.frame({ name: 'data_frame' });
+      if (!nav || !data) throw new Error(`${index}: no navigation or page frame`);
+      await nav.waitForSelector('#navbar a', { state: 'attached', timeout: 10000 });
+      const links = await nav.$$eval('#navbar a', (anchors) => anchors.map((a) => a.getAttribute('href')));
+      for (const link of links) {
+        await data.goto('file://' + path.resolve(report, link));
+        const result = await data.evaluate(brokenTokens);
+        ++pages;
+        tokens += result.checked;
+        for (const token of result.broken) {
+          failures.push(`${path.basename(report)}/${link} at ${viewport.width}x${viewport.height}: ${token}`);
         }
-        await page.close();
       }
+      await page.close();
     }
-  } finally {
-    await browser.close();
   }
   if (failures.length > 0) {
     throw new Error(`${failures.length} tokens broken across lines:\n  ${failures.slice(0, 40).join('\n  ')}`);
   }
   console.log(`ok: ${tokens} tokens on ${pages} page views stand on one line each`);
-  return 0;
-}
-
-main().then((status) => process.exit(status), (error) => {
-  console.error(`FAIL: ${error.message}`);
-  process.exit(1);
 });
