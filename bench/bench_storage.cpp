@@ -121,7 +121,9 @@ void AddATADrives(const boost::shared_ptr<TMemoryNamespace>& ns, unsigned device
 
 int main(int argc, char** argv) {
     const unsigned drives = argc > 1 ? static_cast<unsigned>(std::strtoul(argv[1], nullptr, 10)) : 2000;
-    const std::string dir = argc > 2 ? argv[2] : "bench-storage-out";
+    // The scratch directory defaults to the system's, not the working directory.
+    const std::string dir =
+        argc > 2 ? argv[2] : (std::filesystem::temp_directory_path() / "bench_storage").string();
     std::filesystem::create_directories(dir);
 
     auto start = std::chrono::steady_clock::now();
