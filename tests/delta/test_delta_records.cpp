@@ -1,5 +1,7 @@
 // The comparison of collections into delta records: which instances match,
 // what each kind of change records, and what the records say.
+#include <sys/stat.h>
+
 #include <algorithm>
 #include <functional>
 #include <sstream>
@@ -10,6 +12,7 @@
 #include "delta/TClassDelta.h"
 #include "repository/CIMXMLReader.h"
 #include "repository/CIMXMLWriter.h"
+#include "repository/MemoryClass.h"
 #include "tkrcore/Callbacks.h"
 
 namespace braigrion {
@@ -224,6 +227,35 @@ TEST(DeltaRecords, SavedRecordsReadBackAlike) {
     TNs loaded = repository::LoadCollectionFromString(xml.str(), "records.xml").fNamespace;
     EXPECT_EQ(Records(records), Records(loaded));
     EXPECT_EQ(1u, Records(loaded).size());
+}
+
+// A storage array as its own WBEM server reported it, compared with itself
+// and with a collection that lacks its fans: its keys name the array in
+// SystemName, which the matching leaves out.
+TEST(DeltaRecords, ARealStorageArrayCapture) {
+    const std::string dir = BRAIGRION_SOURCE_DIR "/../shared/realcim/storage_array/";
+    struct stat info {};
+    if (stat(dir.c_str(), &info) != 0) GTEST_SKIP() << "real server captures not found at " << dir;
+    std::vector<std::string> all, withoutFans;
+    for (const char* name : {"ArrayChassis", "DiskDrive", "Fan", "PowerSupply", "StorageSystem"}) {
+        all.push_back(dir + "EMC_" + name + ".xml");
+        if (std::string(name) != "Fan") withoutFans.push_back(dir + "EMC_" + name + ".xml");
+    }
+    TNs array = repository::LoadCollection(all).fNamespace;
+    EXPECT_EQ(std::vector<std::string>{},
+              Records(repository::ComputeDeltaRecords({array, repository::LoadCollection(all).fNamespace})));
+
+    const std::vector<std::string> records =
+        Records(repository::ComputeDeltaRecords({array, repository::LoadCollection(withoutFans).fNamespace}));
+    const repository::TMemoryClass* fans = array->FindClass("Symm_FanDevice");
+    ASSERT_TRUE(fans);
+    ASSERT_GT(fans->GetInstanceCount(), 0u);
+    EXPECT_EQ(fans->GetInstanceCount(), records.size());
+    for (const std::string& record : records) {
+        EXPECT_EQ(0u, record.find("Symm_FanDevice 1 Symm_FanDevice.CreationClassName=")) << record;
+        EXPECT_EQ(std::string::npos, record.find("SystemName=")) << record;
+        EXPECT_EQ(record.size() - 4, record.find(" [1]")) << record;
+    }
 }
 
 }  // namespace
