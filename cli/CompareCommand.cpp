@@ -13,6 +13,7 @@
 
 #include "CollectionLoader.h"
 #include "Commands.h"
+#include "Progress.h"
 #include "ReportDirectory.h"
 #include "RunContext.h"
 #include "repository/CIMXMLWriter.h"
@@ -130,23 +131,31 @@ int RunCompare(const TCompareOptions& options, std::ostream& out, std::ostream& 
     if (!options.fRecords.empty() && !options.fSaveRecords.empty()) {
         throw TInputError("--records and --save-records exclude each other");
     }
+    TProgressLine progress(err, progressToErr && !options.fQuiet);
     std::vector<boost::shared_ptr<repository::TMemoryNamespace>> collections;
     for (const std::string& argument : options.fCollections) {
+        progress.Step("loading collection " + std::to_string(collections.size() + 1) + " of " +
+                      std::to_string(options.fCollections.size()) + ": " + argument);
         repository::TLoadResult loaded = LoadFiles(CollectionFiles(argument));
+        progress.Finish();
         for (const std::string& warning : loaded.fWarnings) err << "braigrion: warning: " << warning << '\n';
         loaded.fNamespace->SetName(argument);
         collections.push_back(loaded.fNamespace);
     }
     boost::shared_ptr<repository::TMemoryNamespace> records;
     if (!options.fRecords.empty()) {
+        progress.Step("loading the delta records: " + options.fRecords);
         records = LoadFiles({options.fRecords}).fNamespace;
+        progress.Finish();
         CheckRecords(*records, options.fRecords, collections.size());
     }
     TReportDirectory directory(options.fOutput, options.fForce);
 
     if (!records) {
         repository::TDeltaSummary summary;
+        progress.Step("comparing " + std::to_string(collections.size()) + " collections");
         records = repository::ComputeDeltaRecords(collections, &summary);
+        progress.Finish();
         for (const std::string& className : summary.fNamedByValues) {
             err << "braigrion: warning: " << className
                 << ": the keys do not tell its instances apart; they were matched by their values\n";

@@ -9,10 +9,14 @@ TProgressLine::TProgressLine(std::ostream& out, bool show) : fOut(out), fShow(sh
 
 TProgressLine::~TProgressLine() { Finish(); }
 
-void TProgressLine::Page(size_t number, size_t total, const std::string& pageID) {
+void TProgressLine::Step(const std::string& text) {
     if (!fShow) return;
-    fOut << "\r\033[Kbraigrion: page " << number << " of " << total << ": " << pageID << std::flush;
+    fOut << "\r\033[Kbraigrion: " << text << std::flush;
     fLineShown = true;
+}
+
+void TProgressLine::Page(size_t number, size_t total, const std::string& pageID) {
+    Step("page " + std::to_string(number) + " of " + std::to_string(total) + ": " + pageID);
 }
 
 void TProgressLine::Finish() {

@@ -1,5 +1,6 @@
-// Progress of a report on a terminal: "page N of M: PageID", updated in
-// place as the report starts each page.
+// Progress of a run on a terminal, one line updated in place: what is being
+// loaded or compared, then "page N of M: PageID" as the report starts each
+// page.
 #pragma once
 
 #include <iosfwd>
@@ -14,9 +15,12 @@ public:
     TProgressLine(std::ostream& out, bool show);
     ~TProgressLine();
 
+    // A step before the pages, such as "loading collection 2 of 3: DIR".
+    void Step(const std::string& text);
     // Observer of TReport::Write.
     void Page(size_t number, size_t total, const std::string& pageID);
-    // Clears the progress line.
+    // Clears the progress line, as anything else written to the stream
+    // must first.
     void Finish();
 
 private:

@@ -7,6 +7,7 @@
 
 #include "CollectionLoader.h"
 #include "Commands.h"
+#include "Progress.h"
 #include "ReportDirectory.h"
 #include "RunContext.h"
 #include "THtmlWriter_vmwesxi.h"
@@ -90,7 +91,11 @@ int RunReport(const TReportOptions& options, std::ostream& out, std::ostream& er
         return RunCompare(delta, out, err, progressToErr);
     }
     SetUpLog(options.fRun);
+    TProgressLine progress(err, progressToErr && !options.fQuiet);
+    progress.Step("loading " + std::to_string(options.fFiles.size()) +
+                  (options.fFiles.size() == 1 ? " file" : " files"));
     repository::TLoadResult loaded = LoadFiles(options.fFiles);
+    progress.Finish();
     for (const std::string& warning : loaded.fWarnings) err << "braigrion: warning: " << warning << '\n';
     TReportDirectory directory(options.fOutput, options.fForce);
 

@@ -173,6 +173,32 @@ TEST(CompareCommand, SavedRecordsGiveTheSameReport) {
     fs::remove_all(work);
 }
 
+TEST(CompareCommand, ShowsWhatItLoadsAndComparesBeforeThePages) {
+    const fs::path work = fs::temp_directory_path() / ("braigrion-compare-progress-" + std::to_string(::getpid()));
+    fs::remove_all(work);
+    fs::create_directories(work);
+    cli::TCompareOptions options;
+    options.fCollections = {kSamples + "linux-server", kSamples + "linux-server-later"};
+    options.fFormat = "text";
+    options.fOutput = (work / "report").string();
+    std::ostringstream out, err;
+    ASSERT_EQ(0, cli::RunCompare(options, out, err, true)) << err.str();
+    // Each step replaces the one before on the same line, in this order.
+    const std::string progress = err.str();
+    size_t at = 0;
+    for (const std::string& step : {"\r\033[Kbraigrion: loading collection 1 of 2: " + kSamples + "linux-server",
+                                    "\r\033[Kbraigrion: loading collection 2 of 2: " + kSamples + "linux-server-later",
+                                    std::string("\r\033[Kbraigrion: comparing 2 collections"),
+                                    std::string("\r\033[Kbraigrion: page 1 of ")}) {
+        at = progress.find(step, at);
+        ASSERT_NE(std::string::npos, at) << step << " in\n" << progress;
+    }
+    // The line is cleared before the summary, which ends the run.
+    EXPECT_NE(std::string::npos, progress.find("\r\033[Kbraigrion: 12 pages written")) << progress;
+    EXPECT_EQ(options.fOutput + "/index.txt\n", out.str());
+    fs::remove_all(work);
+}
+
 TEST(CompareCommand, TheHtmlReportMarksDifferencesAndAgreement) {
     const fs::path work = fs::temp_directory_path() / ("braigrion-compare-html-" + std::to_string(::getpid()));
     fs::remove_all(work);
