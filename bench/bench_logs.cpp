@@ -30,6 +30,7 @@
 #include <vector>
 
 #include "BenchClock.h"
+#include "NullWriter.h"
 #include "braigrion/ReportDefinition.h"
 #include "braigrion/TWriter.h"
 #include "repository/CIMXMLReader.h"
@@ -54,9 +55,8 @@ namespace repo = braigrion::repository;
 
 // A back-end that renders what a real one would (each value cell's text,
 // each grid) and keeps only counts.
-class TRenderingWriter : public TWriter {
+class TRenderingWriter : public bench::TNullWriter {
 public:
-    size_t fCells = 0;
     size_t fBytes = 0;
     size_t fPages = 0;
 
@@ -65,40 +65,9 @@ public:
         fMode = context.count("mode") ? static_cast<std::string>(context["mode"]) : std::string("default");
         fWriterType = TKR_REPORT_DEFINITION::TKR_WRITER_TYPE_HTML;
     }
-    void StartReport() override {}
-    void EndCategory() override {}
-    void WriteCategory(const std::string&) override {}
-    void EndReport() override {}
-    std::string GetInventoryPage() override { return std::string(); }
-    void WriteHalcyonEventLog(const std::vector<TInstancePtr>&, const std::string&, const std::string&) override {}
     void WriteEventLogReport(TReportParameters params) override { WriteGenericReport(params); }
     void WriteMergedLogPage(TReportParameters params) override { WriteGenericReport(params); }
-    void WriteMelodyPrologue(const std::string&) override {}
-    void WriteMelodyDeviceRow(TInstancePtr, const std::string&, const std::string&, const std::string&,
-                              const std::string&, const std::string&, const std::string&, const std::string&,
-                              int) override {}
-    void WriteMelodyTableStart() override {}
-    void WriteDriveHealthEntry(TPropertyPtr) override {}
-    void WriteDeclarationHeader(TPropertyDeclPtr) override {}
-    void WriteDriveHealthValue(TInstancePtr, TPropertyPtr) override {}
-    void WriteRegisterValue(TInstancePtr, TPropertyPtr) override {}
     void OpenPage(const std::string&) override { ++fPages; }
-    void ClosePage() override {}
-    void WritePageHeader() override {}
-    void WritePageFooter() override {}
-    void WriteReportTitle(const std::string&, const std::string&, const std::string&) override {}
-    void WriteReportTitleWithLink(const std::string&, const std::string&, const std::string&) override {}
-    void WriteIndexEntry(const std::string&, const std::string&, const bool&) override {}
-    void WriteTableBreak() override {}
-    void WriteTableTitle(const std::string&, const bool&, const bool&) override {}
-    void StartColumnTable(const std::string&, const std::string&, bool) override {}
-    void StartPropertyTable(const std::string&, const std::string&, const std::string&) override {}
-    void WriteHeaderCell(TClassPtr, TReportProperty) override {}
-    void EndTableHeader() override {}
-    void StartRow(const bool&) override {}
-    void EndRow() override {}
-    void EndTable() override {}
-    void WriteRowBreak(int) override {}
     void WriteTableGrid(TTable& table) override {
         fCells += table.fCells.size();
         for (const TTable::TCell& cell : table.fCells) fBytes += cell.text.size();
@@ -111,11 +80,6 @@ public:
         ++fCells;
         fBytes += text.size() + link.size();
     }
-    void WriteMessageCell(TReportProperty, const std::string&) override {}
-    void WriteSensorCell(TInstancePtr, const std::string&, const std::string&) override {}
-    void WriteSortScript() override {}
-    std::string EscapeText(std::string text) override { return text; }
-    std::string GetSeparatorText(int) override { return ", "; }
 };
 
 repo::TPropertyDeclData Declared(const std::string& name, TType::ECIMType type, bool key = false) {

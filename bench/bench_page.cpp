@@ -22,6 +22,7 @@
 #include <vector>
 
 #include "BenchClock.h"
+#include "NullWriter.h"
 #include "braigrion/TWriter.h"
 #include "repository/CIMXMLReader.h"
 #include "repository/CIMXMLWriter.h"
@@ -42,55 +43,6 @@ using NORVTKR20::TCIMDateTime;
 using NORVTKR20::TCIMValue;
 typedef NORVTKR20::TCIMValue::TCIMType TType;
 
-// A back-end that takes everything and keeps nothing but a count of cells.
-class TDiscardingWriter : public TWriter {
-public:
-    size_t fCells = 0;
-
-    void Initialize(TNamespacePtr, TContext, const std::string& outputPath) override { fOutputPath = outputPath; }
-    void StartReport() override {}
-    void EndCategory() override {}
-    void WriteCategory(const std::string&) override {}
-    void EndReport() override {}
-    std::string GetInventoryPage() override { return std::string(); }
-    void WriteHalcyonEventLog(const std::vector<TInstancePtr>&, const std::string&, const std::string&) override {}
-    void WriteEventLogReport(TReportParameters) override {}
-    void WriteMergedLogPage(TReportParameters) override {}
-    void WriteMelodyPrologue(const std::string&) override {}
-    void WriteMelodyDeviceRow(TInstancePtr, const std::string&, const std::string&, const std::string&,
-                              const std::string&, const std::string&, const std::string&, const std::string&,
-                              int) override {}
-    void WriteMelodyTableStart() override {}
-    void WriteDriveHealthEntry(TPropertyPtr) override {}
-    void WriteDeclarationHeader(TPropertyDeclPtr) override {}
-    void WriteDriveHealthValue(TInstancePtr, TPropertyPtr) override {}
-    void WriteRegisterValue(TInstancePtr, TPropertyPtr) override {}
-    void OpenPage(const std::string&) override {}
-    void ClosePage() override {}
-    void WritePageHeader() override {}
-    void WritePageFooter() override {}
-    void WriteReportTitle(const std::string&, const std::string&, const std::string&) override {}
-    void WriteReportTitleWithLink(const std::string&, const std::string&, const std::string&) override {}
-    void WriteIndexEntry(const std::string&, const std::string&, const bool&) override {}
-    void WriteTableBreak() override {}
-    void WriteTableTitle(const std::string&, const bool&, const bool&) override {}
-    void StartColumnTable(const std::string&, const std::string&, bool) override {}
-    void StartPropertyTable(const std::string&, const std::string&, const std::string&) override {}
-    void WriteHeaderCell(TClassPtr, braigrion::TReportProperty) override {}
-    void EndTableHeader() override {}
-    void StartRow(const bool&) override {}
-    void EndRow() override {}
-    void EndTable() override {}
-    void WriteRowBreak(int) override {}
-    void WriteTableGrid(TTable& table) override { fCells += table.fCells.size(); }
-    void WriteValueCell(TInstancePtr, braigrion::TReportProperty, std::string) override {}
-    void WriteTextCell(braigrion::TReportProperty, std::string, std::string) override {}
-    void WriteMessageCell(braigrion::TReportProperty, const std::string&) override {}
-    void WriteSensorCell(TInstancePtr, const std::string&, const std::string&) override {}
-    void WriteSortScript() override {}
-    std::string EscapeText(std::string text) override { return text; }
-    std::string GetSeparatorText(int) override { return ", "; }
-};
 
 braigrion::repository::TPropertyDeclData Declared(const std::string& name, TType::ECIMType type) {
     braigrion::repository::TPropertyDeclData declaration;
@@ -158,7 +110,7 @@ TReportParameters LogPage(bool filteredAndSorted) {
 }
 
 void WritePage(const char* name, TWriter::TNamespacePtr ns, bool filteredAndSorted) {
-    TDiscardingWriter writer;
+    bench::TNullWriter writer;
     writer.BaseInitialize(ns, {}, boost::shared_ptr<braigrion::TReportParametersBuilder>(
                                       new braigrion::TReportParametersBuilder(ns, "default", false)));
     writer.Initialize(ns, {}, "out");
