@@ -124,7 +124,7 @@ public:
                     fEntries.push_back(TEntry{std::move(name), std::vector<TMemoryInstance*>(fClasses.size())});
                 }
                 size_t at = found.first->second;
-                if (fEntries[at].fSlots[c] || fDuplicates.count(at)) {
+                if (fEntries[at].fSlots[c] || (pairDuplicates && fDuplicates.count(at))) {
                     if (!pairDuplicates) return false;
                     at = NextDuplicate(at, c);
                 }
